@@ -1,0 +1,7 @@
+// Platform base: result codes, the library exception and text conversions.
+#pragma once
+
+#include "lumen/export.h"
+#include "lumen/platform/error_codes.h"
+#include "lumen/platform/lumen_exception.h"
+#include "lumen/platform/text_conversion.h"

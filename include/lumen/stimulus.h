@@ -1,0 +1,5 @@
+// Stimulus arrays: segments and the InputArray built from them.
+#pragma once
+
+#include "lumen/stimulus/input_array.h"
+#include "lumen/stimulus/segment.h"

@@ -1,0 +1,159 @@
+// InputArray: the stimulus array, an ordered list of Segments read as one array of doubles.
+//
+// A cheap copy-on-write value: copies share the segment list and the flattened point cache
+// until one of them changes. A 20001-point linear sweep is one segment until a caller asks
+// for raw points; then one flattened vector serves the array and all its segments.
+// Thread-safety: confine each object to one thread (const reads may build the cache and
+// repoint the shared segments); copies may live on different threads.
+#pragma once
+
+#include <boost/shared_ptr.hpp>
+
+#include <cstddef>
+#include <iosfwd>
+#include <iterator>
+#include <vector>
+
+#include "lumen/export.h"
+#include "lumen/stimulus/segment.h"
+
+namespace LumenUtility {
+
+class LUMEN_API InputArray {
+ public:
+  class const_iterator {
+   public:
+    using iterator_category = std::random_access_iterator_tag;
+    using value_type = double;
+    using difference_type = std::ptrdiff_t;
+    using pointer = void;
+    using reference = double;
+
+    const_iterator() = default;
+    const_iterator(unsigned int index, const InputArray* array) : m_index(index), m_array(array) {}
+    double operator*() const { return (*m_array)[m_index]; }
+    double operator[](difference_type n) const { return (*m_array)[m_index + n]; }
+    const_iterator& operator++() { ++m_index; return *this; }
+    const_iterator operator++(int) { const_iterator old = *this; ++m_index; return old; }
+    const_iterator& operator--() { --m_index; return *this; }
+    const_iterator operator--(int) { const_iterator old = *this; --m_index; return old; }
+    const_iterator& operator+=(difference_type n) { m_index += n; return *this; }
+    const_iterator& operator-=(difference_type n) { m_index -= n; return *this; }
+    friend const_iterator operator+(const_iterator it, difference_type n) { return it += n; }
+    friend const_iterator operator+(difference_type n, const_iterator it) { return it += n; }
+    friend const_iterator operator-(const_iterator it, difference_type n) { return it -= n; }
+    friend difference_type operator-(const const_iterator& a, const const_iterator& b) {
+      return static_cast<difference_type>(a.m_index) - static_cast<difference_type>(b.m_index);
+    }
+    friend bool operator==(const const_iterator& a, const const_iterator& b) {
+      return a.m_index == b.m_index && a.m_array == b.m_array;
+    }
+    friend auto operator<=>(const const_iterator& a, const const_iterator& b) {
+      return a.m_index <=> b.m_index;
+    }
+
+   private:
+    unsigned int m_index = 0;
+    const InputArray* m_array = nullptr;
+  };
+
+  InputArray();
+  explicit InputArray(const Segment& s);
+  InputArray(double value, int n);
+  InputArray(double start, double stop, int n, SegmentType t);
+  explicit InputArray(const std::vector<double>& v);
+  InputArray(const double* p, unsigned int n);
+
+  unsigned int size() const { return m_size; }
+  bool empty() const { return m_size == 0; }
+  // Point i; LumenException(E_FAIL, "index") for i >= size().
+  double operator[](unsigned int i) const;
+  double at(unsigned int i) const { return (*this)[i]; }
+  double front() const { return (*this)[0]; }
+  double back() const { return (*this)[m_size - 1]; }
+  const_iterator begin() const { return const_iterator(0, this); }
+  const_iterator end() const { return const_iterator(m_size, this); }
+
+  unsigned int NumSegments() const;
+  const std::vector<Segment>& GetSegments() const;
+  // Throws LumenException(E_FAIL, "segIndex") for k >= NumSegments().
+  Segment GetSegment(unsigned int k) const;
+  // Throws LumenException(E_FAIL, "index") past the end.
+  const Segment& GetSegmentFromPtIndex(int i) const;
+
+  void GetArray(std::vector<double>& out) const;
+  std::vector<double> GetArray() const;
+  // The flattened points, shared; built on first use.
+  boost::shared_ptr<const std::vector<double>> GetArrayPtr() const;
+  // Null when empty, else the first flattened point.
+  const double* GetRawArray() const;
+
+  // Smallest / largest point. Throws LumenException(E_FAIL) for an array without segments.
+  double min_element() const;
+  double max_element() const;
+  bool IsConstant() const;
+  bool IsMonotonic() const;
+  bool IsRamp() const;
+  // Range test: min(other) - min(this) <= tolerance and max(this) - max(other) <= tolerance.
+  bool IsSubsetOf(const InputArray& other, double tolerance) const;
+  // Every point of this array, counted with repeats, occurs exactly in `other`.
+  bool IsExactSubset(const InputArray& other) const;
+  // `indices` becomes, in rising order, every i with low <= point i <= high.
+  void SplitInputArrayAtValue(double low, double high, std::vector<int>& indices) const;
+
+  bool operator==(const InputArray& other) const;
+  bool operator!=(const InputArray& other) const { return !(*this == other); }
+
+  void SetArray(const Segment& s);
+  void SetArray(double value, int n);
+  void SetArray(double start, double stop, int n, SegmentType t);
+  void SetArray(const std::vector<double>& v);
+  void SetArray(const double* p, unsigned int n);
+  void push_back(const Segment& s);
+  void pop_back();
+  // Inserts before segment k; LumenException(E_FAIL) for k > NumSegments().
+  void insert(const Segment& s, unsigned int k);
+  void erase(unsigned int k);
+  // Throws LumenException(E_FAIL, "segIndex") for k >= NumSegments().
+  void ReplaceSegment(const Segment& s, unsigned int k);
+  // Segment k becomes two of m and count - m points. Throws the HRESULT E_INVALIDARG for
+  // m < 1 and LumenException(E_FAIL) for m >= count or k >= NumSegments().
+  void SplitSegment(unsigned int k, unsigned int m);
+  // Only for exactly one segment: sets its count to n; false when there is not exactly one
+  // segment or the count already is n. Throws LumenException(E_FAIL) for an Arbitrary
+  // segment asked to grow past its stored points.
+  bool Resize(int n);
+  void reverse();
+  void clear();
+  InputArray& operator+=(double x);
+  InputArray& operator*=(double x);
+  InputArray operator+(double x) const;
+  InputArray operator*(double x) const;
+  // Concatenation.
+  void operator+=(const InputArray& other);
+  // Replaces arbitrary runs by Linear segments (steps within 0.01 stimulus units).
+  void OptimizeRepresentation();
+  // Replaces runs of exactly equal points by Fixed segments.
+  void OptimizeRepresentationOnlyFixed();
+  InputArray ExtractInputArray(const std::vector<int>& indices) const;
+
+ private:
+  std::vector<Segment>& MutableSegments();
+  void RefreshCache() const;
+  void ClearCache();
+
+  unsigned int m_size;
+  boost::shared_ptr<std::vector<Segment>> m_pSegments;
+  mutable boost::shared_ptr<std::vector<double>> m_pArray;
+};
+
+// Gives every array the same segment boundaries. Throws LumenException(E_FAIL) when the
+// arrays do not all hold the same number of points.
+LUMEN_API void ConformSegments(std::vector<InputArray>& arrays);
+
+// Text form: "(" segments separated by line feeds ")", 15 significant digits.
+LUMEN_API std::wostream& operator<<(std::wostream& os, const InputArray& a);
+// Fail state and target unchanged unless the input is a complete "(...)" form.
+LUMEN_API std::wistream& operator>>(std::wistream& is, InputArray& a);
+
+}  // namespace LumenUtility

@@ -1,0 +1,11 @@
+// Subcommands of lumenutil; each family of commands registers itself on the app.
+#pragma once
+
+#include <CLI/CLI.hpp>
+
+namespace lumenutil {
+
+// Adds `version`.
+void AddVersionCommand(CLI::App& app);
+
+}  // namespace lumenutil
