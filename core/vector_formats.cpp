@@ -5,6 +5,7 @@
 
 #include "lumen/platform/error_codes.h"
 #include "lumen/platform/lumen_exception.h"
+#include "lumen/stimulus/input_array.h"
 
 namespace LumenUtility {
 
@@ -13,6 +14,7 @@ namespace {
 constexpr double kPi = 3.141592653589793;
 constexpr double kTwoPi = 6.283185307179586;
 constexpr double kInvTwoPi = 0.15915494309189535;
+constexpr double kHalfPi = 1.5707963267948966;
 
 }  // namespace
 
@@ -71,6 +73,23 @@ void Sqrt(std::vector<TsComplex>& v) {
     const double keep = std::abs((root / previous).Phase());
     const double flip = std::abs((-root / previous).Phase());
     v[i] = keep > flip ? -root : root;
+  }
+}
+
+void SqrtEx(const InputArray& stimulus, float expectedPhase, std::vector<TsComplex>& v) {
+  Sqrt(v);
+  if (v.empty() || stimulus.empty()) return;
+  const int n = static_cast<int>(v.size());
+  std::vector<float> unwrapped(n);
+  FormatUnwrappedPhase(v.data(), unwrapped.data(), 0, n);
+  const double slope =
+      (double{unwrapped[n - 1]} - unwrapped[0]) / (stimulus.back() - stimulus.front());
+  // Phase the line gains from stimulus 0 to the first point, negated.
+  const double x = -stimulus.front() * slope;
+  const double delta =
+      (TsComplex::FromMagPhase(1.0, x) / TsComplex::FromMagPhase(1.0, expectedPhase)).Phase();
+  if (std::abs(delta) > kHalfPi) {
+    for (TsComplex& z : v) z = -z;
   }
 }
 

@@ -9,6 +9,7 @@
 
 #include "lumen/platform/error_codes.h"
 #include "lumen/platform/lumen_exception.h"
+#include "lumen/stimulus/input_array.h"
 
 namespace LumenUtility {
 namespace {
@@ -194,6 +195,46 @@ TEST(VectorFormats, SqrtKeepsTheBranchContinuous) {
   Sqrt(negative);
   EXPECT_NEAR(negative[0].re, 0.0, 1e-6);
   EXPECT_NEAR(negative[0].im, 2.0, 1e-6);
+}
+
+TEST(VectorFormats, SqrtExRecoversTheRootOfADelayLine) {
+  // Root r(f) = a(f) e^{j(phase0 - 2 pi f tau)}; the data is r^2. Whatever the first point's
+  // principal root, the sign decision must give back r itself.
+  const double tau = 1e-9;  // s
+  for (double phase0 : {0.0, 0.3, -2.0, 3.0}) {
+    for (double start : {0.0, 0.1e9, 0.3e9, 0.6e9, 1.9e9, 7.77e9}) {
+      const int n = 201;
+      const double stop = start + 2e9;
+      const InputArray stimulus(start, stop, n, Linear);
+      std::vector<TsComplex> root(n), data(n);
+      for (int i = 0; i < n; ++i) {
+        const double f = stimulus[i];
+        root[i] = TsComplex::FromMagPhase(0.9 - 1e-11 * f, phase0 - 2 * kPi * f * tau);
+        data[i] = root[i] * root[i];
+      }
+      SqrtEx(stimulus, static_cast<float>(phase0), data);
+      for (int i = 0; i < n; i += 50) {
+        EXPECT_NEAR(data[i].re, root[i].re, 1e-5) << phase0 << " " << start << " " << i;
+        EXPECT_NEAR(data[i].im, root[i].im, 1e-5) << phase0 << " " << start << " " << i;
+      }
+    }
+  }
+}
+
+TEST(VectorFormats, SqrtExLeavesDegenerateInputsAsSqrtDoes) {
+  const std::vector<TsComplex> data = {TsComplex(-1, 0.1), TsComplex(-1, -0.1)};
+  std::vector<TsComplex> plain = data;
+  Sqrt(plain);
+
+  std::vector<TsComplex> flat = data;  // equal end points: slope 0/0
+  SqrtEx(InputArray(5.0, 2), 3.0f, flat);
+  EXPECT_EQ(flat, plain);
+  std::vector<TsComplex> noStimulus = data;
+  SqrtEx(InputArray(), 3.0f, noStimulus);
+  EXPECT_EQ(noStimulus, plain);
+  std::vector<TsComplex> empty;
+  SqrtEx(InputArray(1.0, 2.0, 2, Linear), 0.0f, empty);
+  EXPECT_TRUE(empty.empty());
 }
 
 }  // namespace

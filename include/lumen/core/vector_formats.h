@@ -41,11 +41,14 @@ LUMEN_API void Invert(std::vector<TsComplex>& v);
 // so a trace whose phase winds past pi keeps a smooth root instead of flipping sign.
 LUMEN_API void Sqrt(std::vector<TsComplex>& v);
 
-// Sqrt, then a sign for the whole trace: the root's unwrapped phase is fitted by a line
-// through its end points over `stimulus` (same length as v, usually Hz), and the trace is
-// negated when that line's phase at stimulus 0 lies more than pi/2 from `expectedPhase`
-// (radians). An empty trace or stimulus, or a stimulus whose first and last points are equal,
-// leaves the sign of the roots as Sqrt chose it.
+// Sqrt, then a sign for the whole trace, for roots whose phase is near a line through
+// `expectedPhase` (radians) at stimulus 0, such as the transmission of a reciprocal path from
+// its squared product. The line's slope is that of the root's unwrapped phase between its end
+// points over `stimulus` (same length as v, usually Hz). Point 0 of Sqrt is the principal
+// root, which lies within pi/2 of the line's value at the first point exactly when the line,
+// run back from there to stimulus 0, lands within pi/2 of expectedPhase; otherwise the trace
+// is negated. An empty trace or stimulus, or a stimulus whose first and last points are equal,
+// leaves the signs as Sqrt chose them.
 LUMEN_API void SqrtEx(const InputArray& stimulus, float expectedPhase, std::vector<TsComplex>& v);
 
 // Element-wise a[i]*b[i], a.size() points. Throws LumenException(E_INVALIDARG) when b holds
