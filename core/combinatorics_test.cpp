@@ -36,8 +36,7 @@ TEST(Combinatorics, CombinationFollowsPascalsTriangleUntilItOverflows) {
           row[k] <= std::numeric_limits<std::int32_t>::max() ? row[k] : -1;
       ASSERT_EQ(Combination(n, k), expected) << n << " " << k;
       if (n <= 20) {
-        ASSERT_EQ(Combination(n, k),
-                  NA_Factorial(n) / (NA_Factorial(n - k) * NA_Factorial(k)));
+        ASSERT_EQ(Combination(n, k), NA_Factorial(n) / (NA_Factorial(n - k) * NA_Factorial(k)));
       }
     }
   }

@@ -6,9 +6,13 @@ namespace LumenUtility {
 
 namespace {
 
-bool IsDigit(wchar_t c) { return c >= L'0' && c <= L'9'; }
+bool IsDigit(wchar_t c) {
+  return c >= L'0' && c <= L'9';
+}
 
-bool IsSpace(wchar_t c) { return c != L'\0' && std::iswspace(static_cast<wint_t>(c)) != 0; }
+bool IsSpace(wchar_t c) {
+  return c != L'\0' && std::iswspace(static_cast<wint_t>(c)) != 0;
+}
 
 // Digit runs read as integers: the longer run is larger; between runs of equal length the
 // first differing digit decides.
@@ -37,7 +41,9 @@ int CompareLeftAligned(const wchar_t* a, const wchar_t* b) {
   }
 }
 
-wchar_t Upper(wchar_t c) { return static_cast<wchar_t>(std::towupper(static_cast<wint_t>(c))); }
+wchar_t Upper(wchar_t c) {
+  return static_cast<wchar_t>(std::towupper(static_cast<wint_t>(c)));
+}
 
 int Compare(const wchar_t* a, const wchar_t* b, bool foldCase) {
   if (a == nullptr) a = L"";
@@ -63,8 +69,12 @@ int Compare(const wchar_t* a, const wchar_t* b, bool foldCase) {
 
 }  // namespace
 
-int strnatcmp(const wchar_t* a, const wchar_t* b) { return Compare(a, b, false); }
+int strnatcmp(const wchar_t* a, const wchar_t* b) {
+  return Compare(a, b, false);
+}
 
-int strnatcmpNoCase(const wchar_t* a, const wchar_t* b) { return Compare(a, b, true); }
+int strnatcmpNoCase(const wchar_t* a, const wchar_t* b) {
+  return Compare(a, b, true);
+}
 
 }  // namespace LumenUtility

@@ -12,8 +12,8 @@ constexpr int kSmallestExponent = -24;
 // One character per power of 1000 from 1e-24 to 1e24; the blank at index 8 is 1e0.
 constexpr wchar_t kPrefixes[] = L"yzafpn\u00B5m kMGTPEZY";
 // 10^-e for e = -24, -21, ..., 24, as exact decimal literals (10^24 itself is not a double).
-constexpr double kScales[] = {1e24, 1e21, 1e18,  1e15,  1e12,  1e9,   1e6,   1e3,  1e0,
-                              1e-3, 1e-6, 1e-9,  1e-12, 1e-15, 1e-18, 1e-21, 1e-24};
+constexpr double kScales[] = {1e24, 1e21, 1e18, 1e15,  1e12,  1e9,   1e6,   1e3,  1e0,
+                              1e-3, 1e-6, 1e-9, 1e-12, 1e-15, 1e-18, 1e-21, 1e-24};
 static_assert(sizeof kPrefixes / sizeof kPrefixes[0] == 18, "17 prefixes and a terminator");
 static_assert(sizeof kScales / sizeof kScales[0] == 17, "one scale per prefix");
 
@@ -34,8 +34,7 @@ int PrefixExponent(double value, int maxExponent, int minExponent) {
 
 }  // namespace
 
-void GetSIPrefix(double value, double& scale, wchar_t& prefix, int maxExponent,
-                 int minExponent) {
+void GetSIPrefix(double value, double& scale, wchar_t& prefix, int maxExponent, int minExponent) {
   const int index = PrefixExponent(value, maxExponent, minExponent) / 3 + 8;
   scale = kScales[index];
   prefix = kPrefixes[index];

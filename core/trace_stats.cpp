@@ -8,8 +8,7 @@ namespace LumenUtility {
 namespace {
 
 template <typename T>
-void Accumulate(const T* begin, const T* end, T& mean, T& stdDev, T& min, T& max,
-                T& meanSquare) {
+void Accumulate(const T* begin, const T* end, T& mean, T& stdDev, T& min, T& max, T& meanSquare) {
   if (begin == nullptr || end == nullptr || end <= begin) return;
   const std::ptrdiff_t n = end - begin;
   double sum = 0.0;
@@ -53,8 +52,8 @@ void ComputeStats(const float* begin, const float* end, float& mean, float& stdD
   Accumulate(begin, end, mean, stdDev, min, max, meanSquare);
 }
 
-void ComputeStats(const double* begin, const double* end, double& mean, double& stdDev,
-                  double& min, double& max, double& meanSquare) {
+void ComputeStats(const double* begin, const double* end, double& mean, double& stdDev, double& min,
+                  double& max, double& meanSquare) {
   Accumulate(begin, end, mean, stdDev, min, max, meanSquare);
 }
 
