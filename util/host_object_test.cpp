@@ -31,7 +31,7 @@ class IOtherProbe {
 };
 
 // Two bases, so the IProbe part sits at an offset from the object's start.
-class Probe : public IOtherProbe, public IProbe {
+class Probe final : public IOtherProbe, public IProbe {
  public:
   explicit Probe(int answer) : m_answer(answer) {}
   int Answer() const override { return m_answer; }
