@@ -9,12 +9,12 @@ namespace Interface {
 class ITimeDomainMarkerSetup {
  public:
   // How often the signal travels the line between the reference plane and the marker.
-  enum DistanceMarkerMode {
+  enum DistanceMarkerMode : int {
     DISTANCE_TRANSMISSION = 0,  // once (transmission measurements)
     DISTANCE_REFLECTION = 1,    // there and back (reflection measurements): time covers 2x
   };
-  // Unit of the distance; other values are read as metres.
-  enum DistanceMarkerUnit {
+  // Unit of the distance; any other value is read as metres (hence the fixed int type).
+  enum DistanceMarkerUnit : int {
     DISTANCE_METERS = 0,
     DISTANCE_FEET = 1,
     DISTANCE_INCHES = 2,
