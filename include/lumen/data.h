@@ -1,0 +1,7 @@
+// Measurement data containers and files: Touchstone traces and their reader.
+#pragma once
+
+#include "lumen/data/sn_parameter.h"
+#include "lumen/data/sn_parameter_s.h"
+#include "lumen/data/snp_file_base.h"
+#include "lumen/data/snp_types.h"
