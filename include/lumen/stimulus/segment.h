@@ -54,8 +54,10 @@ class LUMEN_API Segment {
   double front() const { return at(0); }
   // Throws LumenException(E_FAIL, "Segment::back()") when empty.
   double back() const;
-  double min_element();
-  double max_element();
+  // Smallest / largest point; constant time except for Arbitrary. An empty Arbitrary segment
+  // gives NaN.
+  double min_element() const;
+  double max_element() const;
 
   // Fractional point index (integer part: point; fraction: share of the way to the next)
   // at which the segment reaches `value`, or -1.0 when it lies outside [front, back].
@@ -81,6 +83,7 @@ class LUMEN_API Segment {
 
  private:
   friend class InputArray;
+  friend std::wostream& operator<<(std::wostream& os, const Segment& s);
 
   // View `pCache` from `offset`; a null pointer detaches (see the cache rules in the .cpp).
   // Throws LumenException(E_FAIL, "Invalid pCache set in Segment::SetCache") when the vector
@@ -90,6 +93,10 @@ class LUMEN_API Segment {
   void RefreshCache(const std::vector<double>& values) const;
   void RefreshCache(const double* values, unsigned int n) const;
   void ClearCache() const;
+  // Changes an Arbitrary segment's points through `change`, writing into a private vector.
+  template <typename Change>
+  void ChangeArbitraryPoints(Change change);
+  const double* CachedPoints() const { return m_pCache->data() + m_offset; }
 
   double m_start;
   double m_stop;
