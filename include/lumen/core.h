@@ -2,3 +2,4 @@
 #pragma once
 
 #include "lumen/core/ts_complex.h"
+#include "lumen/core/vector_formats.h"
