@@ -40,18 +40,6 @@ TEST(CapabilityTable, LookupGrowsInnerLevelOnlyOfExistingRow) {
   EXPECT_EQ(table.MiddleSize(1), 3u);
 }
 
-TEST(CapabilityTable, SetOverwritesAndKeepsNeighbours) {
-  CapabilityTable table;
-  table.Set(0, 0, 0, 5);
-  table.Set(0, 0, 2, 6);
-  table.Set(0, 0, 0, 8);
-  EXPECT_EQ(table.Get(0, 0, 0), 8);
-  EXPECT_EQ(table.Get(0, 0, 1), 0);
-  EXPECT_EQ(table.Get(0, 0, 2), 6);
-  table.Set(0, 0, 1, 9);  // inside the row: no growth
-  EXPECT_EQ(table.InnerSize(0, 0), 3u);
-}
-
 TEST(CapabilityTable, FindListsNonZeroEntriesAscendingAndGrowsOuterLevel) {
   CapabilityTable table;
   EXPECT_EQ(table.Find(2, 0), Indices{});
@@ -65,6 +53,7 @@ TEST(CapabilityTable, FindListsNonZeroEntriesAscendingAndGrowsOuterLevel) {
   EXPECT_EQ(table.Find(2, 1), (Indices{0, 3, 6}));
   EXPECT_EQ(table.Find(2, 0), (Indices{4}));
   EXPECT_EQ(table.Find(2, 9), Indices{});
+  EXPECT_EQ(table.InnerSize(2, 6), 2u);  // looking never grows rows
   EXPECT_EQ(table.Find(7, 1), Indices{});
   EXPECT_EQ(table.OuterSize(), 8u);
 }
@@ -106,10 +95,12 @@ TEST(CapabilityTable, MissingOrNegativeIndicesChangeNothing) {
   EXPECT_EQ(table.Get(1, 1, 1), 5);
 }
 
-TEST(CapabilityTable, ClearZeroesOneEntryAndReturnsItsType) {
+TEST(CapabilityTable, SetOverwritesAndClearZeroesOneEntry) {
   CapabilityTable table;
+  table.Set(0, 1, 2, 39);
   table.Set(0, 1, 2, 40);
   table.Set(0, 1, 0, 41);
+  EXPECT_EQ(table.Get(0, 1, 2), 40);
   EXPECT_EQ(table.Clear(0, 1, 2), 2);
   EXPECT_EQ(table.Get(0, 1, 2), 0);
   EXPECT_EQ(table.Get(0, 1, 0), 41);

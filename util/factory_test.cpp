@@ -3,7 +3,6 @@
 #include <gtest/gtest.h>
 
 #include <boost/function/function_base.hpp>
-#include <stdexcept>
 #include <string>
 
 namespace LumenUtility {
@@ -62,12 +61,6 @@ TEST(Factory, CreatorMayUnregisterItself) {
   });
   EXPECT_EQ(boost::any_cast<std::string>(factory.Create(L"once")).size(), 1000u);
   EXPECT_EQ(CreateError(factory, L"once"), kEmpty);
-}
-
-TEST(Factory, CreatorExceptionPassesThrough) {
-  Factory factory;
-  factory.Register(L"fails", []() -> boost::any { throw std::runtime_error("host failure"); });
-  EXPECT_THROW(factory.Create(L"fails"), std::runtime_error);
 }
 
 TEST(Factory, ProcessWideFactoryIsShared) {

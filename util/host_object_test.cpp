@@ -78,8 +78,16 @@ TEST(HostObject, RealObjectRoundTripsThroughTable) {
   EXPECT_EQ(FindHostObject<IOtherProbe>(41, 0), nullptr);  // type is part of the key
   EXPECT_EQ(FindHostObject<IProbe>(41, 1), nullptr);
 
+  // Removal takes the object out of every index of the category, and only that object.
+  Probe other(5);
+  RegisterHostObject<IProbe>(41, 2, probe.get());
+  RegisterHostObject<IProbe>(41, 1, &other);
+  RemoveHostObject<IProbe>(41, static_cast<IProbe*>(nullptr));  // not a wildcard
   RemoveHostObject<IProbe>(41, probe.get());
   EXPECT_EQ(FindHostObject<IProbe>(41, 0), nullptr);
+  EXPECT_EQ(FindHostObject<IProbe>(41, 2), nullptr);
+  EXPECT_EQ(FindHostObject<IProbe>(41, 1), &other);
+  RemoveHostObject<IProbe>(41, &other);
 }
 
 TEST(HostObject, FindsObjectsRegisteredThroughRawAccessor) {
@@ -93,20 +101,6 @@ TEST(HostObject, FindsObjectsRegisteredThroughRawAccessor) {
   EXPECT_EQ(found->Other(), -7);
   EXPECT_EQ(accessor->FindCapabilities(42, typeIndex), std::vector<int>{3});
   RemoveHostObject<IOtherProbe>(42, &probe);
-}
-
-TEST(HostObject, RemovingOneObjectLeavesOthers) {
-  Probe a(1), b(2);
-  RegisterHostObject<IProbe>(43, 0, &a);
-  RegisterHostObject<IProbe>(43, 1, &b);
-  RegisterHostObject<IProbe>(43, 2, &a);
-  RemoveHostObject<IProbe>(43, &a);
-  EXPECT_EQ(FindHostObject<IProbe>(43, 0), nullptr);
-  EXPECT_EQ(FindHostObject<IProbe>(43, 1), &b);
-  EXPECT_EQ(FindHostObject<IProbe>(43, 2), nullptr);
-  RemoveHostObject<IProbe>(43, static_cast<IProbe*>(nullptr));  // no-op, not a wildcard
-  EXPECT_EQ(FindHostObject<IProbe>(43, 1), &b);
-  RemoveHostObject<IProbe>(43, &b);
 }
 
 }  // namespace
