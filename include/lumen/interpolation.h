@@ -1,0 +1,5 @@
+// Interpolation: resampling of real and complex data from one stimulus array onto another.
+#pragma once
+
+#include "lumen/interpolation/interp_status.h"
+#include "lumen/interpolation/linear_interpolation.h"
