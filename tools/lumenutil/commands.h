@@ -8,4 +8,7 @@ namespace lumenutil {
 // Adds `version`.
 void AddVersionCommand(CLI::App& app);
 
+// Adds `hresult CODE...`: the error number of each code.
+void AddHResultCommand(CLI::App& app);
+
 }  // namespace lumenutil

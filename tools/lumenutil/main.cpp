@@ -8,6 +8,7 @@ int main(int argc, char** argv) {
   CLI::App app{"lumenutil: read, resample, convert and plot network analyzer data"};
   app.require_subcommand(1);
   lumenutil::AddVersionCommand(app);
+  lumenutil::AddHResultCommand(app);
   try {
     app.parse(argc, argv);
   } catch (const CLI::ParseError& e) {

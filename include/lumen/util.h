@@ -1,0 +1,8 @@
+// General utilities: the capabilities table, the object factory, host object lookup and
+// error numbers.
+#pragma once
+
+#include "lumen/util/capabilities_accessor.h"
+#include "lumen/util/factory.h"
+#include "lumen/util/from_hresult.h"
+#include "lumen/util/host_object.h"
