@@ -3,3 +3,4 @@
 
 #include "lumen/interpolation/interp_status.h"
 #include "lumen/interpolation/linear_interpolation.h"
+#include "lumen/interpolation/tarn_interpolation.h"

@@ -26,6 +26,8 @@ inline constexpr HRESULT E_INVALIDARG = MakeHResult(0x80070057);
 inline constexpr HRESULT LUMEN_E_BOUNDS = MakeHResult(0xE8080882);
 // Archived data written by an unknown (newer) version.
 inline constexpr HRESULT LUMEN_E_UNKNOWN_VERSION = MakeHResult(0xE8080867);
+// A vector kernel could not obtain its temporary buffer.
+inline constexpr HRESULT LUMEN_E_KERNEL_BUFFER = MakeHResult(0xE8040453);
 
 constexpr bool Failed(HRESULT hr) { return hr < 0; }
 constexpr bool Succeeded(HRESULT hr) { return hr >= 0; }
