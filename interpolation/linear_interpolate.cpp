@@ -57,7 +57,9 @@ double LinearInterpolate(const double* data, double index) {
   return InterpolateArray(data, index);
 }
 
-float LinearInterpolate(const float* data, double index) { return InterpolateArray(data, index); }
+float LinearInterpolate(const float* data, double index) {
+  return InterpolateArray(data, index);
+}
 
 double LinearInterpolate(const std::vector<double>& data, double index) {
   return InterpolateVector(data, index);

@@ -35,7 +35,7 @@ tagInterpStatus Resample(const InputArray& oldStimulus, const InputArray& newSti
                          L"LinearInterpolation: fewer data values than old stimulus points.");
   }
 
-  const MonotonicLocator locator(oldStimulus);
+  MonotonicLocator locator(oldStimulus);
   const unsigned int newCount = newStimulus.size();
   const double* newPoints = newStimulus.GetRawArray();
   // Resampling a trace in place: read from a copy of the old values.
@@ -65,8 +65,7 @@ tagInterpStatus LinearInterpolation(const InputArray& oldStimulus, const InputAr
 }
 
 tagInterpStatus LinearInterpolation(const InputArray& oldStimulus, const InputArray& newStimulus,
-                                    const std::vector<TsComplex>& in,
-                                    std::vector<TsComplex>& out) {
+                                    const std::vector<TsComplex>& in, std::vector<TsComplex>& out) {
   return Resample(oldStimulus, newStimulus, in, out);
 }
 

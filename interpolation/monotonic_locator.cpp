@@ -20,8 +20,8 @@ MonotonicLocator::MonotonicLocator(const InputArray& stimulus)
     if (!m_pieces.empty()) {
       // The gap from the previous segment's last point to this segment's first one.
       const double previous = m_points[base - 1];
-      m_pieces.push_back({std::min(Key(previous), Key(first)),
-                          std::max(Key(previous), Key(first)), base - 1, 0, nullptr, -1});
+      m_pieces.push_back({std::min(Key(previous), Key(first)), std::max(Key(previous), Key(first)),
+                          base - 1, 0, nullptr, -1});
     }
     std::ptrdiff_t lastStep = -1;
     if (segment.IsArbitrary()) {
@@ -32,28 +32,35 @@ MonotonicLocator::MonotonicLocator(const InputArray& stimulus)
         }
       }
     }
-    m_pieces.push_back({std::min(Key(first), Key(last)), std::max(Key(first), Key(last)), base,
-                        n, &segment, lastStep});
+    m_pieces.push_back({std::min(Key(first), Key(last)), std::max(Key(first), Key(last)), base, n,
+                        &segment, lastStep});
     base += n;
   }
 }
 
-double MonotonicLocator::Find(double value) const {
+double MonotonicLocator::Find(double value) {
   const double key = Key(value);
   // The first piece that can reach the value; pieces before it end below it. Several pieces
   // reach a value that ends one and starts the next, and the earliest accepting one wins.
-  auto it = std::partition_point(m_pieces.begin(), m_pieces.end(),
-                                 [key](const Piece& p) { return p.keyHigh < key; });
+  auto it = m_pieces.begin() + m_lastPiece;
+  const bool hintHolds = it->keyHigh >= key && (m_lastPiece == 0 || it[-1].keyHigh < key);
+  if (!hintHolds) {
+    it = std::partition_point(m_pieces.begin(), m_pieces.end(),
+                              [key](const Piece& p) { return p.keyHigh < key; });
+  }
   for (; it != m_pieces.end() && it->keyLow <= key; ++it) {
     const double candidate = Offer(*it, value);
-    if (candidate >= 0.0) return std::min(candidate, m_size - 1.0);
+    if (candidate >= 0.0) {
+      m_lastPiece = static_cast<std::size_t>(it - m_pieces.begin());
+      return std::min(candidate, m_size - 1.0);
+    }
   }
   const double toFirst = std::fabs(value - m_points[0]);
   const double toLast = std::fabs(value - m_points[m_size - 1]);
   return toLast <= toFirst ? m_size - 1.0 : 0.0;
 }
 
-double MonotonicLocator::Offer(const Piece& piece, double value) const {
+double MonotonicLocator::Offer(const Piece& piece, double value) {
   if (piece.count == 0) {
     const double low = m_points[piece.base];
     const double t = (value - low) / (m_points[piece.base + 1] - low);
@@ -69,20 +76,54 @@ double MonotonicLocator::Offer(const Piece& piece, double value) const {
 // 0 <= (value - a) / (b - a) <= 1. In an ordered segment that is the pair starting at the last
 // point not beyond the value, or, when the value equals the segment's end, the last pair that
 // differs (pairs of equal points never accept).
-double MonotonicLocator::FindInArbitrary(const Piece& piece, double value) const {
+double MonotonicLocator::FindInArbitrary(const Piece& piece, double value) {
   const double* p = m_points + piece.base;
   const double key = Key(value);
-  if (!(key >= Key(p[0]) && key <= Key(p[piece.count - 1]))) return -1.0;
-  auto upper = std::upper_bound(p, p + piece.count, key,
-                                [this](double k, double point) { return k < Key(point); });
-  std::ptrdiff_t i = (upper - p) - 1;
-  if (i == static_cast<std::ptrdiff_t>(piece.count) - 1) {
+  const auto count = static_cast<std::ptrdiff_t>(piece.count);
+  if (!(key >= Key(p[0]) && key <= Key(p[count - 1]))) return -1.0;
+  std::ptrdiff_t i = UpperBound(p, count, key) - 1;
+  m_hint = i;
+  if (i == count - 1) {
     i = piece.lastStep;
     if (i < 0) return piece.base;  // all points equal: no pair accepts, the segment answers 0
   }
   const double r = (value - p[i]) / (p[i + 1] - p[i]);
   if (r >= 0.0 && r <= 1.0) return piece.base + (static_cast<double>(i) + r);
+  ++m_fallbacks;
   return piece.base + piece.segment->Find(value, false);
+}
+
+std::ptrdiff_t MonotonicLocator::UpperBound(const double* p, std::ptrdiff_t count,
+                                            double key) const {
+  const auto above = [&](std::ptrdiff_t i) { return Key(p[i]) > key; };
+  // Gallop from the hint to a bracket [low, high) with p[low] not above and p[high] above the
+  // key (low = -1, high = count standing for the ends), then bisect it.
+  std::ptrdiff_t low = -1, high = count;
+  const std::ptrdiff_t hint = std::clamp<std::ptrdiff_t>(m_hint, 0, count - 1);
+  if (!above(hint)) {
+    low = hint;
+    for (std::ptrdiff_t step = 1; low + step < count; step *= 2) {
+      if (above(low + step)) {
+        high = low + step;
+        break;
+      }
+      low += step;
+    }
+  } else {
+    high = hint;
+    for (std::ptrdiff_t step = 1; high - step >= 0; step *= 2) {
+      if (!above(high - step)) {
+        low = high - step;
+        break;
+      }
+      high -= step;
+    }
+  }
+  while (high - low > 1) {
+    const std::ptrdiff_t mid = low + (high - low) / 2;
+    (above(mid) ? high : low) = mid;
+  }
+  return high;
 }
 
 }  // namespace LumenUtility

@@ -10,8 +10,10 @@
 // (value - a) / (b - a) of the plain search rounds across 0 or 1, which needs neighbouring
 // stimulus steps more than 2^52 apart in size.)
 //
-// Thread-safety: const use from several threads is safe; the stimulus must outlive the
-// locator and stay unchanged.
+// Each search starts from where the previous one ended, so a sweep of new values in order
+// costs about constant time per value (and never more than log N).
+// Thread-safety: confine to one thread (searches update the start hint); the stimulus must
+// outlive the locator and stay unchanged.
 #pragma once
 
 #include <cstddef>
@@ -28,7 +30,11 @@ class MonotonicLocator {
 
   // Fractional index in [0, size - 1]: the value's crossing nearest index 0, or the nearer end
   // index when the stimulus does not reach it (the last on a tie, 0 for NaN).
-  double Find(double value) const;
+  double Find(double value);
+
+  // Searches inside arbitrary segments whose bisected pair the plain search would not accept
+  // (rounding at extreme step ratios) and that were answered by the plain search instead.
+  std::size_t PlainSearchFallbacks() const { return m_fallbacks; }
 
  private:
   // A segment with points, or the gap from the last point of one such segment to the first of
@@ -37,7 +43,7 @@ class MonotonicLocator {
   struct Piece {
     double keyLow;
     double keyHigh;
-    unsigned int base;  // overall index of the segment's first point, or of the gap's start
+    unsigned int base;   // overall index of the segment's first point, or of the gap's start
     unsigned int count;  // segment points; 0 marks a gap
     const Segment* segment;
     // Arbitrary segments: index of the last pair of neighbours that differ, -1 when all equal.
@@ -46,13 +52,18 @@ class MonotonicLocator {
 
   double Key(double value) const { return m_descending ? -value : value; }
   // Candidate of one piece, or a negative number when the piece does not reach the value.
-  double Offer(const Piece& piece, double value) const;
-  double FindInArbitrary(const Piece& piece, double value) const;
+  double Offer(const Piece& piece, double value);
+  double FindInArbitrary(const Piece& piece, double value);
+  // First point in p[0 .. count - 1] whose key exceeds `key`, searched outward from m_hint.
+  std::ptrdiff_t UpperBound(const double* p, std::ptrdiff_t count, double key) const;
 
   const double* m_points;
   unsigned int m_size;
   bool m_descending;
   std::vector<Piece> m_pieces;
+  std::size_t m_lastPiece = 0;  // piece that answered the previous search
+  std::ptrdiff_t m_hint = 0;    // point (within its segment) found by the previous search
+  std::size_t m_fallbacks = 0;
 };
 
 }  // namespace LumenUtility
