@@ -20,13 +20,17 @@ void Fill(float* dst, std::size_t n, float value) {
   std::fill(dst, dst + n, value);
 }
 
+// Ramps index with int32: grid lengths are ints, and int32-to-float converts four lanes at a
+// time where a 64-bit unsigned index has no vector conversion.
 void Ramp(float* dst, std::size_t n, float first, float slope) {
-  for (std::size_t k = 0; k < n; ++k) dst[k] = first + slope * static_cast<float>(k);
+  const auto count = static_cast<std::int32_t>(n);
+  for (std::int32_t k = 0; k < count; ++k) dst[k] = first + slope * static_cast<float>(k);
 }
 
 void Ramp(TsComplex* dst, std::size_t n, TsComplex first, TsComplex slope) {
   float* out = Floats(dst);
-  for (std::size_t k = 0; k < n; ++k) {
+  const auto count = static_cast<std::int32_t>(n);
+  for (std::int32_t k = 0; k < count; ++k) {
     const float step = static_cast<float>(k);
     out[2 * k] = first.re + slope.re * step;
     out[2 * k + 1] = first.im + slope.im * step;
