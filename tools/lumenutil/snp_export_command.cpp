@@ -53,8 +53,9 @@ void WriteTable(const ExportOptions& options, std::ostream& out) {
   for (int i = 0; i < points; ++i) {
     out << Shortest(x[i]);
     for (const std::vector<double>& column : columns) {
-      out << d << (format == TraceFormat::kRI ? Shortest(static_cast<float>(column[i]))
-                                              : Shortest(column[i]));
+      // The data are single-precision values: RI columns read back to the stored floats
+      // exactly, and derived columns carry every digit a float holds, no invented ones.
+      out << d << Shortest(static_cast<float>(column[i]));
     }
     out << '\n';
   }

@@ -26,6 +26,21 @@ std::string BaseName(const std::string& path) {
   return slash == std::string::npos ? path : path.substr(slash + 1);
 }
 
+// Breaks the line where a wrapped phase jumps by more than half a turn, so the wrap is not
+// drawn as a vertical stroke across the chart.
+ChartSeries BreakAtWraps(ChartSeries s) {
+  ChartSeries out{s.name, {}, {}};
+  for (std::size_t i = 0; i < s.y.size(); ++i) {
+    if (i > 0 && std::fabs(s.y[i] - s.y[i - 1]) > 180) {
+      out.x.push_back(NAN);
+      out.y.push_back(NAN);
+    }
+    out.x.push_back(s.x[i]);
+    out.y.push_back(s.y[i]);
+  }
+  return out;
+}
+
 std::string Render(const PlotOptions& options) {
   const CSnPFileBase file = ReadTouchstone(options.path, options.ports);
   std::vector<MatrixPosition> positions = SelectPositions(options.params, file);
@@ -46,7 +61,8 @@ std::string Render(const PlotOptions& options) {
   const bool phase = options.format == "phase";
   for (const MatrixPosition& p : positions) {
     const TraceFormat format = phase ? TraceFormat::kPhase : TraceFormat::kLogMag;
-    series.push_back({p.name, x, FormatColumns(TraceAt(file, p).GetData(), format, 0)[0]});
+    ChartSeries trace{p.name, x, FormatColumns(TraceAt(file, p).GetData(), format, 0)[0]};
+    series.push_back(phase ? BreakAtWraps(std::move(trace)) : std::move(trace));
   }
   const StimulusAxis axis = AxisOf(file.GetResultType());
   CartesianChart chart;
