@@ -1,5 +1,7 @@
 #include "interpolation/vector_kernels.h"
 
+#include <math.h>  // sincosf (GNU)
+
 #include <algorithm>
 #include <cmath>
 
@@ -56,10 +58,10 @@ void Multiply(const TsComplex* a, const TsComplex* b, TsComplex* dst, std::size_
 void Divide(const TsComplex* a, const TsComplex* b, TsComplex* dst, std::size_t n) {
   for (std::size_t k = 0; k < n; ++k) {
     const double ar = a[k].re, ai = a[k].im, br = b[k].re, bi = b[k].im;
-    double d = br * br + bi * bi;
-    d = d == 0.0 ? kZeroDivisorGuard : d;
-    dst[k].re = static_cast<float>((ar * br + ai * bi) / d);
-    dst[k].im = static_cast<float>((ai * br - ar * bi) / d);
+    const double d = br * br + bi * bi;
+    const double inv = 1.0 / (d == 0.0 ? kZeroDivisorGuard : d);
+    dst[k].re = static_cast<float>((ar * br + ai * bi) * inv);
+    dst[k].im = static_cast<float>((ai * br - ar * bi) * inv);
   }
 }
 
@@ -73,8 +75,11 @@ void CartToPolar(const TsComplex* src, float* magnitude, float* phase, std::size
 
 void PolarToCart(const float* magnitude, const float* phase, TsComplex* dst, std::size_t n) {
   for (std::size_t k = 0; k < n; ++k) {
-    dst[k].re = magnitude[k] * std::cos(phase[k]);
-    dst[k].im = magnitude[k] * std::sin(phase[k]);
+    // One joint call: g++ does not merge cos and sin itself while they may set errno.
+    float s, c;
+    ::sincosf(phase[k], &s, &c);
+    dst[k].re = magnitude[k] * c;
+    dst[k].im = magnitude[k] * s;
   }
 }
 
