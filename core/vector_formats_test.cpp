@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include "core/test_util.h"
+
 #include <cmath>
 #include <limits>
 #include <random>
@@ -14,16 +16,9 @@
 namespace LumenUtility {
 namespace {
 
+using testing::ZeroValueGuard;
+
 constexpr double kPi = 3.14159265358979323846;
-
-class ZeroValueGuard {
- public:
-  ZeroValueGuard() : m_saved(TsComplex::GetLogMagZeroValue()) {}
-  ~ZeroValueGuard() { TsComplex::SetLogMagZeroValue(m_saved); }
-
- private:
-  double m_saved;
-};
 
 TsComplex Unit(double angle) {
   return TsComplex::FromMagPhase(1.0, angle);
