@@ -3,7 +3,7 @@
 
 #include "lumen/core/ts_complex.h"
 
-namespace LumenUtility::testing {
+namespace LumenUtility::testutil {
 
 // Restores the process-wide LogMag zero value however a test ends.
 class ZeroValueGuard {
@@ -17,4 +17,4 @@ class ZeroValueGuard {
   double m_saved;
 };
 
-}  // namespace LumenUtility::testing
+}  // namespace LumenUtility::testutil

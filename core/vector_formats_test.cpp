@@ -16,7 +16,7 @@
 namespace LumenUtility {
 namespace {
 
-using testing::ZeroValueGuard;
+using testutil::ZeroValueGuard;
 
 constexpr double kPi = 3.14159265358979323846;
 
