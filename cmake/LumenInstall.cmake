@@ -17,6 +17,8 @@ install(FILES ${PROJECT_BINARY_DIR}/LumenUtilityConfig.cmake
               ${PROJECT_BINARY_DIR}/LumenUtilityConfigVersion.cmake
         DESTINATION ${CMAKE_INSTALL_LIBDIR}/cmake/LumenUtility)
 
+file(RELATIVE_PATH LUMEN_PC_RELATIVE_PREFIX "${CMAKE_INSTALL_FULL_LIBDIR}/pkgconfig"
+     "${CMAKE_INSTALL_PREFIX}")
 configure_file(cmake/lumenutility.pc.in ${PROJECT_BINARY_DIR}/lumenutility.pc @ONLY)
 install(FILES ${PROJECT_BINARY_DIR}/lumenutility.pc
         DESTINATION ${CMAKE_INSTALL_LIBDIR}/pkgconfig)

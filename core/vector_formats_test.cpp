@@ -25,7 +25,9 @@ class ZeroValueGuard {
   double m_saved;
 };
 
-TsComplex Unit(double angle) { return TsComplex::FromMagPhase(1.0, angle); }
+TsComplex Unit(double angle) {
+  return TsComplex::FromMagPhase(1.0, angle);
+}
 
 // Phases of a unit-circle trace that winds in steps of up to 0.95 pi in either direction,
 // starting inside (-pi, pi] so its unwrapped phase is the angle itself.
@@ -176,7 +178,8 @@ TEST(VectorFormats, SqrtKeepsTheBranchContinuous) {
   std::mt19937 rng(11);
   const std::vector<double> angles = RandomWalk(rng, 500);
   std::vector<TsComplex> data(angles.size());
-  for (size_t i = 0; i < angles.size(); ++i) data[i] = TsComplex::FromMagPhase(1 + i % 3, angles[i]);
+  for (size_t i = 0; i < angles.size(); ++i)
+    data[i] = TsComplex::FromMagPhase(1 + i % 3, angles[i]);
   std::vector<TsComplex> roots = data;
   Sqrt(roots);
   for (size_t i = 0; i < roots.size(); ++i) {

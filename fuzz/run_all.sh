@@ -19,6 +19,7 @@ for target in "$build"/fuzz/*_fuzz; do
   [[ -d "${seeds[0]}" ]] || seeds=()
   echo "== $name for ${seconds}s"
   if ! "$target" -max_total_time="$seconds" -rss_limit_mb=2048 -print_final_stats=1 \
+      -artifact_prefix="$build/$name-" \
       "$corpus" "${seeds[@]}" 2>"$build/$name.log"; then
     echo "!! $name found a problem; see $build/$name.log"
     status=1

@@ -17,9 +17,9 @@ namespace {
 // cubic y0 + b t + c t^2 + d t^3. Working in u keeps h^3 out of every divisor, so a very
 // close pair of stimulus points cannot underflow it to zero.
 struct Cubic {
-  double lower, h, y0, B, C, D;
+  double lower, inv_h, y0, B, C, D;
   double operator()(double g) const {
-    const double u = (g - lower) / h;
+    const double u = (g - lower) * inv_h;
     return y0 + u * (B + u * (C + u * D));
   }
 };
@@ -55,7 +55,7 @@ Cubic IntervalCubic(const float* values, const StimulusView<double>& x, int coun
     D = B + S1 - 2.0 * rise;
     C = rise - D - B;
   }
-  return Cubic{x[j], h, y0, B, C, D};
+  return Cubic{x[j], 1.0 / h, y0, B, C, D};
 }
 
 }  // namespace

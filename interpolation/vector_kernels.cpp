@@ -1,5 +1,7 @@
 #include "interpolation/vector_kernels.h"
 
+#include <math.h>  // sincosf (GNU)
+
 #include <algorithm>
 #include <cmath>
 
@@ -20,13 +22,17 @@ void Fill(float* dst, std::size_t n, float value) {
   std::fill(dst, dst + n, value);
 }
 
+// Ramps index with int32: grid lengths are ints, and int32-to-float converts four lanes at a
+// time where a 64-bit unsigned index has no vector conversion.
 void Ramp(float* dst, std::size_t n, float first, float slope) {
-  for (std::size_t k = 0; k < n; ++k) dst[k] = first + slope * static_cast<float>(k);
+  const auto count = static_cast<std::int32_t>(n);
+  for (std::int32_t k = 0; k < count; ++k) dst[k] = first + slope * static_cast<float>(k);
 }
 
 void Ramp(TsComplex* dst, std::size_t n, TsComplex first, TsComplex slope) {
   float* out = Floats(dst);
-  for (std::size_t k = 0; k < n; ++k) {
+  const auto count = static_cast<std::int32_t>(n);
+  for (std::int32_t k = 0; k < count; ++k) {
     const float step = static_cast<float>(k);
     out[2 * k] = first.re + slope.re * step;
     out[2 * k + 1] = first.im + slope.im * step;
@@ -52,10 +58,10 @@ void Multiply(const TsComplex* a, const TsComplex* b, TsComplex* dst, std::size_
 void Divide(const TsComplex* a, const TsComplex* b, TsComplex* dst, std::size_t n) {
   for (std::size_t k = 0; k < n; ++k) {
     const double ar = a[k].re, ai = a[k].im, br = b[k].re, bi = b[k].im;
-    double d = br * br + bi * bi;
-    d = d == 0.0 ? kZeroDivisorGuard : d;
-    dst[k].re = static_cast<float>((ar * br + ai * bi) / d);
-    dst[k].im = static_cast<float>((ai * br - ar * bi) / d);
+    const double d = br * br + bi * bi;
+    const double inv = 1.0 / (d == 0.0 ? kZeroDivisorGuard : d);
+    dst[k].re = static_cast<float>((ar * br + ai * bi) * inv);
+    dst[k].im = static_cast<float>((ai * br - ar * bi) * inv);
   }
 }
 
@@ -69,8 +75,11 @@ void CartToPolar(const TsComplex* src, float* magnitude, float* phase, std::size
 
 void PolarToCart(const float* magnitude, const float* phase, TsComplex* dst, std::size_t n) {
   for (std::size_t k = 0; k < n; ++k) {
-    dst[k].re = magnitude[k] * std::cos(phase[k]);
-    dst[k].im = magnitude[k] * std::sin(phase[k]);
+    // One joint call: g++ does not merge cos and sin itself while they may set errno.
+    float s, c;
+    ::sincosf(phase[k], &s, &c);
+    dst[k].re = magnitude[k] * c;
+    dst[k].im = magnitude[k] * s;
   }
 }
 

@@ -26,10 +26,11 @@ inline const float* Floats(const TsComplex* v) {
 // dst[k] = value for k < n.
 void Fill(float* dst, std::size_t n, float value);
 
-// dst[k] = first + slope * k for k < n (real ramp).
+// dst[k] = first + slope * k for k < n (real ramp); n < 2^31.
 void Ramp(float* dst, std::size_t n, float first, float slope);
 
-// dst[k] = first + slope * k for k < n, with real and imaginary parts ramped independently.
+// dst[k] = first + slope * k for k < n, with real and imaginary parts ramped independently;
+// n < 2^31.
 void Ramp(TsComplex* dst, std::size_t n, TsComplex first, TsComplex slope);
 
 // v[k] *= factor for k < n, in place.

@@ -84,24 +84,17 @@ bool InputArray::Resize(int n) {
   return true;
 }
 
-void InputArray::OptimizeRepresentation() {
-  if (m_size == 0) return;
-  if (m_size == 1 && NumSegments() == 1 && !m_pSegments->front().IsArbitrary()) {
-    SetArray((*this)[0], 1);
-    return;
-  }
-  InputArray candidate = BuildCandidate(GetArray(), true);
-  const bool singleArbitrary = NumSegments() == 1 && m_pSegments->front().IsArbitrary();
-  if (candidate.NumSegments() < NumSegments() || singleArbitrary) *this = candidate;
-}
+void InputArray::OptimizeRepresentation() { AdoptRunsIfSimpler(true); }
 
-void InputArray::OptimizeRepresentationOnlyFixed() {
+void InputArray::OptimizeRepresentationOnlyFixed() { AdoptRunsIfSimpler(false); }
+
+void InputArray::AdoptRunsIfSimpler(bool linearRuns) {
   if (m_size == 0) return;
   if (m_size == 1 && NumSegments() == 1 && !m_pSegments->front().IsArbitrary()) {
     SetArray((*this)[0], 1);
     return;
   }
-  InputArray candidate = BuildCandidate(GetArray(), false);
+  InputArray candidate = BuildCandidate(GetArray(), linearRuns);
   const bool singleArbitrary = NumSegments() == 1 && m_pSegments->front().IsArbitrary();
   if (candidate.NumSegments() < NumSegments() || singleArbitrary) *this = candidate;
 }

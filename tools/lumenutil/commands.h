@@ -11,4 +11,7 @@ void AddVersionCommand(CLI::App& app);
 // Adds `hresult CODE...`: the error number of each code.
 void AddHResultCommand(CLI::App& app);
 
+// Adds `snp` and its commands on Touchstone files.
+void AddSnpCommand(CLI::App& app);
+
 }  // namespace lumenutil

@@ -9,6 +9,7 @@ int main(int argc, char** argv) {
   app.require_subcommand(1);
   lumenutil::AddVersionCommand(app);
   lumenutil::AddHResultCommand(app);
+  lumenutil::AddSnpCommand(app);
   try {
     app.parse(argc, argv);
   } catch (const CLI::ParseError& e) {

@@ -139,6 +139,9 @@ class LUMEN_API InputArray {
 
  private:
   std::vector<Segment>& MutableSegments();
+  // Replaces the array by its runs (linear or constant) when that takes fewer segments or
+  // the array is one arbitrary segment.
+  void AdoptRunsIfSimpler(bool linearRuns);
   void RefreshCache() const;
   void ClearCache();
 

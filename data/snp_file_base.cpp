@@ -1,0 +1,161 @@
+#include "lumen/data/snp_file_base.h"
+
+#include <sys/stat.h>
+
+#include <algorithm>
+#include <cerrno>
+#include <cstdio>
+#include <cstring>
+#include <cwchar>
+#include <memory>
+#include <string>
+
+#include "data/touchstone_parser.h"
+#include "lumen/platform/text_conversion.h"
+
+using LumenUtility::InputArray;
+
+namespace {
+
+// Reading in blocks this large keeps the number of system calls small (about ten for a
+// 10 MB file) while the parse runs over one contiguous buffer.
+constexpr std::size_t kReadBlock = std::size_t{1} << 20;
+
+struct FileCloser {
+  void operator()(std::FILE* f) const { std::fclose(f); }
+};
+
+// Index of the stored pair that holds matrix position (row, column), both from 1, in a
+// triangular layout of n ports; the other triangle mirrors the stored one.
+int TriangleIndex(SnPMatrixFormat format, int n, int row, int column) {
+  if (format == SNP_MATRIX_LOWER) {
+    return column <= row ? (row - 1) * row / 2 + column - 1
+                         : (column - 1) * column / 2 + row - 1;
+  }
+  return row <= column ? (row - 1) * n - row * (row - 1) / 2 + column - 1
+                       : (column - 1) * n - column * (column - 1) / 2 + row - 1;
+}
+
+std::wstring TraceName(const wchar_t* prefix, int row, int column) {
+  wchar_t name[64];
+  std::swprintf(name, 64, row < 10 && column < 10 ? L"%lsS%d%d" : L"%lsS%d_%d", prefix, row,
+                column);
+  return name;
+}
+
+}  // namespace
+
+CSnPFileBase::CSnPFileBase(int ports)
+    : CSNParameterS(static_cast<SNPType>(ports)), m_constructedPorts(ports) {}
+
+int CSnPFileBase::ReadSNPFile(const std::wstring& path) {
+  const std::string narrowPath = LumenUtility::WideToUtf8(path);
+  std::unique_ptr<std::FILE, FileCloser> file(std::fopen(narrowPath.c_str(), "rb"));
+  if (!file) {
+    m_readError = L"line 0: cannot open the file: " + LumenUtility::Utf8ToWide(std::strerror(errno));
+    return -1;
+  }
+  std::string text;
+  struct stat status;
+  if (fstat(fileno(file.get()), &status) == 0 && S_ISREG(status.st_mode)) {
+    text.reserve(static_cast<std::size_t>(status.st_size) + kReadBlock);
+  }
+  std::size_t used = 0;
+  for (;;) {
+    text.resize(used + kReadBlock);
+    const std::size_t got = std::fread(text.data() + used, 1, kReadBlock, file.get());
+    used += got;
+    if (got < kReadBlock) break;
+  }
+  text.resize(used);
+  if (std::ferror(file.get())) {
+    m_readError = L"line 0: the file cannot be read: " + LumenUtility::Utf8ToWide(std::strerror(errno));
+    return -1;
+  }
+  return ReadSNPText(text);
+}
+
+int CSnPFileBase::ReadSNPText(std::string_view text) {
+  LumenUtility::TouchstoneContent content;
+  LumenUtility::TouchstoneParser parser(text, static_cast<int>(GetSNPType()));
+  if (!parser.Parse(content)) {
+    m_readError = LumenUtility::Utf8ToWide(parser.Error());
+    return -1;
+  }
+  const int n = content.ports;
+  if (n != static_cast<int>(m_ports)) {
+    m_ports = static_cast<SNPType>(n);
+    m_constructedPorts = n;
+    m_params.assign(static_cast<std::size_t>(n) * static_cast<std::size_t>(n), CSNParameter());
+  }
+  m_twoPortOrder21 = content.twoPortOrder21;
+  if (content.resultTypeGiven) m_resultType = content.resultType;
+  m_info = content.info;
+  m_readError.clear();
+
+  const InputArray stimulus(content.stimulus);
+  const std::size_t points = content.stimulus.size();
+  const bool noise = content.info.noisePoints > 0;
+  const wchar_t* prefix = noise ? L"Noise Figure Cold Source:" : L"";
+
+  // Noise traces of an earlier read describe another file: they go, whether or not this file
+  // brings its own.
+  m_customParams.clear();
+  if (noise) {
+    static const wchar_t* const kNoiseNames[3] = {L"NFmin", L"GammaOpt", L"Rn"};
+    static const ESNPForm kNoiseForms[3] = {SNP_DB, SNP_MA, SNP_RI};
+    const std::size_t records = std::min<std::size_t>(content.info.noisePoints, points);
+    for (int t = 0; t < 3; ++t) {
+      CSNParameter trace(stimulus);
+      trace.SetStimulus(stimulus);
+      for (std::size_t i = 0; i < records; ++i) {
+        const float* record = &content.noise[4 * i];
+        const float a = t == 0 ? record[0] : t == 1 ? record[1] : record[3];
+        const float b = t == 1 ? record[2] : 0.0f;
+        trace.GetData()[i] = CSNParameter::FromPair(a, b, kNoiseForms[t]);
+      }
+      trace.SetName(std::wstring(prefix) + kNoiseNames[t]);
+      m_customParams.push_back(std::move(trace));
+    }
+  }
+
+  const std::size_t pairs = static_cast<std::size_t>(content.pairsPerPoint);
+  const SnPMatrixFormat format = content.info.matrixFormat;
+  for (int k = 0; k < n * n; ++k) {
+    const int row = k / n + 1;
+    const int column = k % n + 1;
+    const std::size_t source = format == SNP_MATRIX_FULL
+                                   ? static_cast<std::size_t>(k)
+                                   : static_cast<std::size_t>(TriangleIndex(format, n, row, column));
+    CSNParameter trace(stimulus);
+    trace.SetStimulus(stimulus);
+    std::vector<LumenUtility::TsComplex>& data = trace.GetData();
+    const float* value = content.values.data() + 2 * source;
+    for (std::size_t i = 0; i < points; ++i, value += 2 * pairs) {
+      data[i] = CSNParameter::FromPair(value[0], value[1], content.info.form);
+    }
+    // Named after the matrix position the trace lands in (for a two-port file in 11, 21,
+    // 12, 22 order the second pair read is S21).
+    const int position = LoopIndex(k);
+    trace.SetName(TraceName(prefix, position / n + 1, position % n + 1));
+    GetLoopParam(k) = std::move(trace);
+  }
+  return static_cast<int>(points);
+}
+
+int SnPPortCountFromFileName(const std::wstring& path) {
+  const std::size_t dot = path.rfind(L'.');
+  if (dot == std::wstring::npos) return -1;
+  const std::wstring extension = path.substr(dot + 1);
+  if (extension.size() < 3 || extension.size() > 5) return -1;
+  if ((extension.front() != L's' && extension.front() != L'S') ||
+      (extension.back() != L'p' && extension.back() != L'P')) {
+    return -1;
+  }
+  int ports = 0;
+  for (std::size_t i = 1; i + 1 < extension.size(); ++i) {
+    if (extension[i] < L'0' || extension[i] > L'9') return -1;
+    ports = ports * 10 + (extension[i] - L'0');
+  }
+  return ports >= 1 && ports <= CSnPFileBase::kMaxPorts ? ports : -1;
+}

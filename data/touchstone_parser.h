@@ -1,0 +1,64 @@
+// TouchstoneParser: turns the text of a Touchstone file (version 1 or 2.0) into its
+// stimulus values and raw value pairs, ready to become traces.
+//
+// Thread-safety: one thread per object; the text must outlive the parser.
+#pragma once
+
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "data/touchstone_scanner.h"
+#include "lumen/data/snp_file_base.h"
+
+namespace LumenUtility {
+
+// What a file holds, before conversion into traces.
+struct TouchstoneContent {
+  int ports = 2;
+  bool twoPortOrder21 = true;       // pairs 11, 21, 12, 22 in a two-port file
+  bool resultTypeGiven = false;     // the option line named SEC, DBM or POINT
+  ResultType resultType = RESULT_FREQUENCY;
+  SnPFileInfo info;
+  int pairsPerPoint = 0;
+  std::vector<double> stimulus;     // scaled to Hz (or the file's own unit), one per point
+  std::vector<float> values;        // pairsPerPoint (a, b) pairs per point, in file order
+  std::vector<float> noise;         // per noise record: 2*NFmin dB, |GammaOpt|, angle deg, Rn ohms
+};
+
+class TouchstoneParser {
+ public:
+  // `ports`: the port count of version 1 files (version 2 files name their own).
+  TouchstoneParser(std::string_view text, int ports);
+
+  // Fills `content`; false on malformed text, with Error() saying what and where.
+  bool Parse(TouchstoneContent& content);
+  const std::string& Error() const { return m_error; }
+
+ private:
+  bool Fail(const std::string& message);
+  bool FailAtLine(int line, const std::string& message);
+  bool ReadByteOrderMark();
+  bool ReadVersionAndOptionLine();
+  bool ReadOptionLine(std::string_view line);
+  bool ReadKeywords();
+  bool ReadKeywordValue(const std::string& name);
+  bool ReadNetworkData();
+  bool ReadAfterDeclaredPoints();
+  bool ReadDataKeyword(std::string_view token, bool& stop);
+  // Reads noise records; `firstStimulus` is true when the stimulus token of the first record
+  // has already been read.
+  bool ReadNoiseData(bool firstStimulus);
+  // Reads `count` values of one record into `out`, skipping comments; `what` names the
+  // record for errors.
+  bool ReadRecordValues(int count, int recordLine, const char* what, std::vector<float>& out);
+  bool KeywordInteger(const std::string& name, int& value);
+
+  std::string_view m_text;
+  int m_ports;
+  TouchstoneScanner m_scanner;
+  TouchstoneContent* m_content = nullptr;
+  std::string m_error;
+};
+
+}  // namespace LumenUtility

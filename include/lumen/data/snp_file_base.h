@@ -1,0 +1,70 @@
+// CSnPFileBase: reads a Touchstone file (version 1 or 2.0) into the traces of a
+// CSNParameterS, and carries them onto other stimulus points.
+//
+// Reading fills one trace per matrix position, named "S11", "S21", ... ("S10_1" and the like
+// past nine ports), all on the file's stimulus points in Hz (or in the file's own unit when
+// it holds seconds, dBm or point numbers, see GetResultType). Two-port noise data adds
+// three custom traces. A failed read leaves the object as it was and says why in
+// GetReadError. Thread-safety: confine each object to one thread. A copyable value.
+#pragma once
+
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "lumen/data/sn_parameter_s.h"
+#include "lumen/data/snp_types.h"
+#include "lumen/export.h"
+
+// Facts about the last file read successfully, beyond its traces.
+struct SnPFileInfo {
+  int version = 0;                    // 1 or 2; 0 before the first successful read
+  std::string stimulusUnit = "GHZ";   // the option line's unit token, upper case
+  double stimulusMultiplier = 1e9;    // stimulus unit of the file, in Hz (1 for SEC, DBM...)
+  char parameter = 'S';               // S, Y, Z, H or G as the option line names it
+  ESNPForm form = SNP_MA;
+  double referenceResistance = 50.0;  // ohms, the option line's R
+  std::vector<double> portReferences;  // ohms per port from [Reference]; empty without it
+  SnPMatrixFormat matrixFormat = SNP_MATRIX_FULL;
+  int declaredFrequencies = 0;  // [Number of Frequencies]; 0 when absent
+  int noisePoints = 0;          // noise records read (two-port files only)
+};
+
+class LUMEN_API CSnPFileBase : public CSNParameterS {
+ public:
+  // Networks larger than this are refused as implausible (a 999-port matrix already holds
+  // about a million traces).
+  static constexpr int kMaxPorts = 999;
+
+  // Empty traces for `ports` ports; sweep and result type 0. Precondition: 1 <= ports <= 999.
+  explicit CSnPFileBase(int ports = 2);
+
+  // Reads the Touchstone file at `path` (UTF-8 on disk). Version 1 files are read with the
+  // object's port count; a version 2 file's [Number of Ports] replaces it. Returns the
+  // number of stimulus points of network data read, or -1 when the file cannot be opened or
+  // is malformed (GetReadError then says what and where).
+  int ReadSNPFile(const std::wstring& path);
+  // The same for file contents already in memory.
+  int ReadSNPText(std::string_view text);
+
+  // Why the last read failed, as "line N: ..." (line 0 when no line is to blame); empty
+  // after a successful read.
+  const std::wstring& GetReadError() const { return m_readError; }
+  const SnPFileInfo& GetFileInfo() const { return m_info; }
+
+  SweepTypeEnum GetSweepType() const { return m_sweepType; }
+  void SetSweepType(SweepTypeEnum type) { m_sweepType = type; }
+  ResultType GetResultType() const { return m_resultType; }
+  void SetResultType(ResultType type) { m_resultType = type; }
+
+ private:
+  int m_constructedPorts;
+  SweepTypeEnum m_sweepType = SWEEP_UNSPECIFIED;
+  ResultType m_resultType = RESULT_FREQUENCY;
+  SnPFileInfo m_info;
+  std::wstring m_readError;
+};
+
+// The port count a file name implies: N of an ".sNp" extension (any case), or -1 when the
+// name has no such extension or N is outside 1..999.
+LUMEN_API int SnPPortCountFromFileName(const std::wstring& path);

@@ -1,0 +1,12 @@
+// The `snp` commands on Touchstone files; each adds itself to the `snp` command.
+#pragma once
+
+#include <CLI/CLI.hpp>
+
+namespace lumenutil {
+
+void AddSnpInfoCommand(CLI::App& snp);
+void AddSnpExportCommand(CLI::App& snp);
+void AddSnpPlotCommand(CLI::App& snp);
+
+}  // namespace lumenutil

@@ -1,0 +1,101 @@
+#include <fstream>
+#include <iostream>
+#include <memory>
+#include <stdexcept>
+#include <string>
+#include <vector>
+
+#include "lumenutil/snp_commands.h"
+#include "lumenutil/snp_file.h"
+#include "lumenutil/trace_format.h"
+
+namespace lumenutil {
+namespace {
+
+struct ExportOptions {
+  std::string path;
+  std::string params;
+  std::string format = "ri";
+  std::string delimiter = ",";
+  std::string output;
+  int ports = 0;
+  int limit = 0;
+};
+
+void WriteTable(const ExportOptions& options, std::ostream& out) {
+  const CSnPFileBase file = ReadTouchstone(options.path, options.ports);
+  const SnPFileInfo& info = file.GetFileInfo();
+  const TraceFormat format = TraceFormatFromName(options.format);
+  if (info.parameter != 'S' && (format == TraceFormat::kSWR || format == TraceFormat::kZ ||
+                                format == TraceFormat::kY)) {
+    std::cerr << "lumenutil snp export: warning: " << options.path << " holds " << info.parameter
+              << "-parameters; " << options.format << " treats them as reflection coefficients\n";
+  }
+  const std::vector<MatrixPosition> positions = SelectPositions(options.params, file);
+  const std::string& d = options.delimiter;
+
+  out << AxisOf(file.GetResultType()).column;
+  std::vector<std::vector<double>> columns;
+  for (const MatrixPosition& p : positions) {
+    for (const std::string& name : ColumnNames(format, p.name)) out << d << name;
+    const double z0 = static_cast<int>(info.portReferences.size()) >= p.row
+                          ? info.portReferences[p.row - 1]
+                          : info.referenceResistance;
+    for (std::vector<double>& column : FormatColumns(TraceAt(file, p).GetData(), format, z0)) {
+      columns.push_back(std::move(column));
+    }
+  }
+  out << '\n';
+  const LumenUtility::InputArray& stimulus = file.GetParam(SNP_S11).GetStimulus();
+  int points = static_cast<int>(stimulus.size());
+  if (options.limit > 0 && options.limit < points) points = options.limit;
+  const std::vector<double> x = stimulus.GetArray();
+  for (int i = 0; i < points; ++i) {
+    out << Shortest(x[i]);
+    for (const std::vector<double>& column : columns) {
+      // The data are single-precision values: RI columns read back to the stored floats
+      // exactly, and derived columns carry every digit a float holds, no invented ones.
+      out << d << Shortest(static_cast<float>(column[i]));
+    }
+    out << '\n';
+  }
+  if (!out) throw std::runtime_error("writing the table failed");
+}
+
+void Export(const ExportOptions& options) {
+  if (options.output.empty() || options.output == "-") {
+    WriteTable(options, std::cout);
+    return;
+  }
+  std::ofstream out(options.output);
+  if (!out) throw std::runtime_error(options.output + ": cannot be written");
+  WriteTable(options, out);
+}
+
+}  // namespace
+
+void AddSnpExportCommand(CLI::App& snp) {
+  CLI::App* command = snp.add_subcommand(
+      "export", "Write the traces of a Touchstone file as a table (CSV by default), one row "
+                "per stimulus point, numbers with enough digits to read back exactly");
+  auto options = std::make_shared<ExportOptions>();
+  command->add_option("FILE", options->path, "Touchstone file")->required();
+  command->add_option("--params,-p", options->params,
+                      "comma-separated traces, e.g. S21,S11 (default: all, in file order)");
+  command->add_option("--format,-f", options->format,
+                      "ri, ma (linear magnitude, degrees), db (dB, degrees), logmag, phase, "
+                      "uphase (unwrapped), swr, z (ohms), y (siemens)")
+      ->check(CLI::IsMember(TraceFormatNames()))
+      ->capture_default_str();
+  command->add_option("--delimiter,-d", options->delimiter, "column separator")
+      ->capture_default_str();
+  command->add_option("--limit,-n", options->limit, "only the first N points")
+      ->check(CLI::NonNegativeNumber);
+  command->add_option("--ports", options->ports,
+                      "port count of a version 1 file whose name does not end in .sNp")
+      ->check(CLI::Range(1, CSnPFileBase::kMaxPorts));
+  command->add_option("--output,-o", options->output, "output file (default: standard output)");
+  command->callback([options] { Export(*options); });
+}
+
+}  // namespace lumenutil

@@ -1,0 +1,50 @@
+// What the `snp` commands share: reading a Touchstone file with errors that name the file
+// and line, choosing traces by name, and printing numbers that read back exactly.
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "lumen/data.h"
+
+namespace lumenutil {
+
+// Reads the Touchstone file at `path` (UTF-8). Version 1 files are read as `ports` ports when
+// that is above 0, else as the ".sNp" extension says, else as two ports. Throws
+// std::runtime_error("PATH: line N: what is wrong") when the file cannot be read.
+CSnPFileBase ReadTouchstone(const std::string& path, int ports);
+
+// A matrix position, rows and columns from 1, and its trace name ("S21", "S1_10").
+struct MatrixPosition {
+  int row;
+  int column;
+  std::string name;
+};
+
+// The positions named in a comma-separated list such as "S21,s11,S1_10" (order kept), or,
+// for an empty list, every position in the order a file lists them (S11, S21, S12, S22 for a
+// two-port file in that order). Throws std::runtime_error for a name that is not a position
+// of a `ports`-port network.
+std::vector<MatrixPosition> SelectPositions(const std::string& list, const CSnPFileBase& file);
+
+// The trace at `position`.
+const CSNParameter& TraceAt(const CSnPFileBase& file, const MatrixPosition& position);
+
+// The shortest decimal text that reads back to exactly `value`.
+std::string Shortest(double value);
+std::string Shortest(float value);
+
+// What the stimulus column of a file holds, for labels and column headers.
+struct StimulusAxis {
+  std::string quantity;  // "Frequency", "Time", "Power", "Point"
+  std::string unit;      // "Hz", "s", "dBm", ""
+  std::string column;    // CSV header: "frequency_Hz", ...
+  bool siPrefix;         // whether values take engineering prefixes (1.5 GHz)
+};
+StimulusAxis AxisOf(ResultType type);
+
+// `value` with an engineering prefix for `unit` and at most `digits` significant digits,
+// as "1.5 GHz"; without a prefix when `siPrefix` is false ("-10 dBm").
+std::string WithUnit(double value, const std::string& unit, bool siPrefix, int digits = 6);
+
+}  // namespace lumenutil

@@ -1,0 +1,94 @@
+#include <iostream>
+#include <memory>
+#include <string>
+
+#include "lumenutil/snp_commands.h"
+#include "lumenutil/snp_file.h"
+
+namespace lumenutil {
+namespace {
+
+struct InfoOptions {
+  std::string path;
+  int ports = 0;
+};
+
+const char* FormName(ESNPForm form) {
+  switch (form) {
+    case SNP_RI:
+      return "real-imaginary (RI)";
+    case SNP_DB:
+      return "dB-angle (DB)";
+    default:
+      return "magnitude-angle (MA)";
+  }
+}
+
+const char* MatrixName(SnPMatrixFormat format) {
+  switch (format) {
+    case SNP_MATRIX_LOWER:
+      return "lower triangle";
+    case SNP_MATRIX_UPPER:
+      return "upper triangle";
+    default:
+      return "full";
+  }
+}
+
+void PrintInfo(const InfoOptions& options) {
+  const CSnPFileBase file = ReadTouchstone(options.path, options.ports);
+  const SnPFileInfo& info = file.GetFileInfo();
+  const CSNParameter& first = file.GetParam(SNP_S11);
+  const StimulusAxis axis = AxisOf(file.GetResultType());
+  const int n = file.GetSNPType();
+  std::ostream& out = std::cout;
+  out << "file         " << options.path << '\n';
+  out << "version      " << (info.version == 2 ? "2.0" : "1") << '\n';
+  out << "ports        " << n << '\n';
+  out << "points       " << first.GetNumPoints() << '\n';
+  out << "stimulus     ";
+  if (first.GetNumPoints() > 0) {
+    out << WithUnit(first.GetStartFreq(), axis.unit, axis.siPrefix) << " to "
+        << WithUnit(first.GetStopFreq(), axis.unit, axis.siPrefix);
+  } else {
+    out << "none";
+  }
+  out << " (" << axis.quantity << ", unit " << info.stimulusUnit << " in the file)\n";
+  out << "parameters   " << info.parameter << ", " << FormName(info.form) << '\n';
+  out << "reference    " << Shortest(info.referenceResistance) << " ohm";
+  if (!info.portReferences.empty()) {
+    out << " (per port:";
+    for (double r : info.portReferences) out << ' ' << Shortest(r);
+    out << ')';
+  }
+  out << '\n';
+  out << "matrix       " << MatrixName(info.matrixFormat) << '\n';
+  if (n == 2) {
+    out << "data order   " << (file.Get2PortDataOrder() ? "11 21 12 22" : "11 12 21 22") << '\n';
+  }
+  out << "noise data   ";
+  if (info.noisePoints > 0) {
+    out << info.noisePoints << " points (NFmin, GammaOpt, Rn)\n";
+  } else {
+    out << "none\n";
+  }
+  out << "traces      ";
+  for (const MatrixPosition& p : SelectPositions("", file)) out << ' ' << p.name;
+  out << '\n';
+}
+
+}  // namespace
+
+void AddSnpInfoCommand(CLI::App& snp) {
+  CLI::App* command =
+      snp.add_subcommand("info", "Describe a Touchstone file: version, ports, points, "
+                                 "stimulus range, value form, reference, layout, noise data");
+  auto options = std::make_shared<InfoOptions>();
+  command->add_option("FILE", options->path, "Touchstone file")->required();
+  command->add_option("--ports", options->ports,
+                      "port count of a version 1 file whose name does not end in .sNp")
+      ->check(CLI::Range(1, CSnPFileBase::kMaxPorts));
+  command->callback([options] { PrintInfo(*options); });
+}
+
+}  // namespace lumenutil

@@ -1,0 +1,111 @@
+#include <cmath>
+#include <fstream>
+#include <memory>
+#include <stdexcept>
+#include <string>
+#include <vector>
+
+#include "lumenutil/snp_commands.h"
+#include "lumenutil/snp_file.h"
+#include "lumenutil/svg_chart.h"
+#include "lumenutil/trace_format.h"
+
+namespace lumenutil {
+namespace {
+
+struct PlotOptions {
+  std::string path;
+  std::string output;
+  std::string format = "logmag";
+  std::string params;
+  int ports = 0;
+};
+
+std::string BaseName(const std::string& path) {
+  const std::size_t slash = path.rfind('/');
+  return slash == std::string::npos ? path : path.substr(slash + 1);
+}
+
+// Breaks the line where a wrapped phase jumps by more than half a turn, so the wrap is not
+// drawn as a vertical stroke across the chart.
+ChartSeries BreakAtWraps(ChartSeries s) {
+  ChartSeries out{s.name, {}, {}};
+  for (std::size_t i = 0; i < s.y.size(); ++i) {
+    if (i > 0 && std::fabs(s.y[i] - s.y[i - 1]) > 180) {
+      out.x.push_back(NAN);
+      out.y.push_back(NAN);
+    }
+    out.x.push_back(s.x[i]);
+    out.y.push_back(s.y[i]);
+  }
+  return out;
+}
+
+std::string Render(const PlotOptions& options) {
+  const CSnPFileBase file = ReadTouchstone(options.path, options.ports);
+  std::vector<MatrixPosition> positions = SelectPositions(options.params, file);
+  const std::vector<double> x = file.GetParam(SNP_S11).GetStimulus().GetArray();
+  std::vector<ChartSeries> series;
+  if (options.format == "smith") {
+    if (options.params.empty()) {
+      // A Smith chart shows reflections; transmissions would only cross it.
+      std::erase_if(positions, [](const MatrixPosition& p) { return p.row != p.column; });
+    }
+    for (const MatrixPosition& p : positions) {
+      const std::vector<std::vector<double>> ri =
+          FormatColumns(TraceAt(file, p).GetData(), TraceFormat::kRI, 0);
+      series.push_back({p.name, ri[0], ri[1]});
+    }
+    return RenderSmithSvg(BaseName(options.path) + ": Smith chart", series);
+  }
+  const bool phase = options.format == "phase";
+  for (const MatrixPosition& p : positions) {
+    const TraceFormat format = phase ? TraceFormat::kPhase : TraceFormat::kLogMag;
+    ChartSeries trace{p.name, x, FormatColumns(TraceAt(file, p).GetData(), format, 0)[0]};
+    series.push_back(phase ? BreakAtWraps(std::move(trace)) : std::move(trace));
+  }
+  const StimulusAxis axis = AxisOf(file.GetResultType());
+  CartesianChart chart;
+  chart.title = BaseName(options.path) + (phase ? ": phase" : ": log magnitude");
+  chart.xQuantity = axis.quantity;
+  chart.xUnit = axis.unit;
+  chart.xSiPrefix = axis.siPrefix;
+  chart.yLabel = phase ? "Phase (degrees)" : "Magnitude (dB)";
+  if (phase) {
+    chart.fixedY = true;
+    chart.yMin = -180;
+    chart.yMax = 180;
+    chart.yStep = 45;
+  }
+  chart.series = std::move(series);
+  return RenderCartesianSvg(chart);
+}
+
+void Plot(const PlotOptions& options) {
+  const std::string svg = Render(options);
+  std::ofstream out(options.output, std::ios::binary);
+  if (!(out << svg)) throw std::runtime_error(options.output + ": cannot be written");
+}
+
+}  // namespace
+
+void AddSnpPlotCommand(CLI::App& snp) {
+  CLI::App* command = snp.add_subcommand(
+      "plot", "Draw the traces of a Touchstone file as an SVG picture: log magnitude or phase "
+              "over the stimulus, or reflections on a Smith chart");
+  auto options = std::make_shared<PlotOptions>();
+  command->add_option("FILE", options->path, "Touchstone file")->required();
+  command->add_option("--output,-o", options->output, "SVG file to write")->required();
+  command->add_option("--format,-f", options->format, "logmag, phase or smith")
+      ->check(CLI::IsMember({"logmag", "phase", "smith"}))
+      ->capture_default_str();
+  command->add_option("--params,-p", options->params,
+                      "comma-separated traces, e.g. S21,S11 (default: all; for smith, the "
+                      "reflections S11, S22, ...)");
+  command->add_option("--ports", options->ports,
+                      "port count of a version 1 file whose name does not end in .sNp")
+      ->check(CLI::Range(1, CSnPFileBase::kMaxPorts));
+  command->callback([options] { Plot(*options); });
+}
+
+}  // namespace lumenutil
