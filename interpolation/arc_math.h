@@ -1,8 +1,8 @@
 // Geometry of circular interpolation between two old points: the circle through three
 // neighbouring points, and the magnitude/phase line used where the circle does not apply.
 // Both are built once per old interval and then evaluated per new point, so a sweep that
-// puts many new points into one interval pays the setup (two arc tangents, one complex
-// division) once.
+// puts many new points into one interval pays the setup (an arcsine, one complex division)
+// once.
 #pragma once
 
 #include "lumen/core/ts_complex.h"
@@ -21,10 +21,21 @@ struct Arc {
   double cy = 0.0;
   TsComplex w0;  // P0 - centre, rounded to float
   TsComplex w1;  // P1 - centre, rounded to float
-  // Turn from P0 to P1 and from P1 to P2 in radians, folded into [-pi/2, pi/2] (the arcsine
-  // of the sine of the turn), positive anticlockwise.
-  double step01 = 0.0;
-  double step12 = 0.0;
+  // Cross products w0 x w1 and w1 x w2 (w2 = P2 - centre) and the squared lengths of w0, w1
+  // and w2: the sine of a turn is its cross product over the product of the lengths.
+  double cross01 = 0.0;
+  double cross12 = 0.0;
+  double norm0 = 0.0;
+  double norm1 = 0.0;
+  double norm2 = 0.0;
+
+  // Whether both turns exceed kMinimumArcStep; false when a point sits on the centre or the
+  // circle is not finite. Compares squares, so it needs neither a root nor an arcsine.
+  bool TurnsAboveMinimum() const;
+  // The turns from P0 to P1 and from P1 to P2 in radians, positive anticlockwise, folded into
+  // [-pi/2, pi/2] as the arcsine of their sine folds them (a turn of 0.6 pi reads as 0.4 pi).
+  double Turn01() const;
+  double Turn12() const;
 };
 
 Arc ArcThrough(TsComplex p0, TsComplex p1, TsComplex p2);

@@ -59,11 +59,9 @@ class IntervalInterpolator {
     // Only exactly even steps: the arc assumes the data turns by equal angles per equal step.
     if (x1 - x0 != x2 - x1) return;
     m_arc = ArcThrough(p0, p1, p2);
-    if (std::fabs(m_arc.step01) <= kMinimumArcStep || std::fabs(m_arc.step12) <= kMinimumArcStep) {
-      return;
-    }
+    if (!m_arc.TurnsAboveMinimum()) return;
     const bool lastInterval = i == m_n - 1;
-    m_step = lastInterval ? m_arc.step12 : m_arc.step01;
+    m_step = lastInterval ? m_arc.Turn12() : m_arc.Turn01();
     m_start = lastInterval ? m_arc.w1 : m_arc.w0;
     m_arcUsable = true;
   }

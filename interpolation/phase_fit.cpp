@@ -21,39 +21,53 @@ struct Quadratic {
   double At(double x) const { return a * x * x + b * x + c; }
 };
 
+// One row of the augmented system: coefficients of the three unknowns, then the right side.
+struct Row {
+  double u, v, w, rhs;
+};
+
+// Exchanges the rows when `exchange` holds, as selects rather than a branch or a copy through
+// memory: the pivot choice is data dependent and the rows should stay in registers.
+inline void ExchangeIf(bool exchange, Row& p, Row& q) {
+  const Row a = p, b = q;
+  p = {exchange ? b.u : a.u, exchange ? b.v : a.v, exchange ? b.w : a.w, exchange ? b.rhs : a.rhs};
+  q = {exchange ? a.u : b.u, exchange ? a.v : b.v, exchange ? a.w : b.w, exchange ? a.rhs : b.rhs};
+}
+
+// A pivot below this magnitude (or NaN) makes the system singular.
+inline bool Usable(double pivot) {
+  return std::fabs(pivot) >= 10000 * DBL_EPSILON;
+}
+
 }  // namespace
 
-bool SolveByInverse3x3(const double m[3][3], const double rhs[3], double v[3]) {
-  double a[3][3], inverse[3][3] = {{1, 0, 0}, {0, 1, 0}, {0, 0, 1}};
-  for (int r = 0; r < 3; ++r) {
-    for (int c = 0; c < 3; ++c) a[r][c] = m[r][c];
-  }
-  for (int col = 0; col < 3; ++col) {
-    int pivot = col;
-    for (int r = col + 1; r < 3; ++r) {
-      if (std::fabs(a[r][col]) > std::fabs(a[pivot][col])) pivot = r;
-    }
-    // Catches NaN too: the comparison fails.
-    if (!(std::fabs(a[pivot][col]) >= 10000 * DBL_EPSILON)) return false;
-    std::swap(a[pivot], a[col]);
-    std::swap(inverse[pivot], inverse[col]);
-    const double scale = 1.0 / a[col][col];
-    for (int c = 0; c < 3; ++c) {
-      a[col][c] *= scale;
-      inverse[col][c] *= scale;
-    }
-    for (int r = 0; r < 3; ++r) {
-      if (r == col) continue;
-      const double factor = a[r][col];
-      for (int c = 0; c < 3; ++c) {
-        a[r][c] -= factor * a[col][c];
-        inverse[r][c] -= factor * inverse[col][c];
-      }
-    }
-  }
-  for (int r = 0; r < 3; ++r) {
-    v[r] = inverse[r][0] * rhs[0] + inverse[r][1] * rhs[1] + inverse[r][2] * rhs[2];
-  }
+bool Solve3x3(const double m[3][3], const double rhs[3], double v[3]) {
+  // Gauss-Jordan on the augmented rows, written out column by column. Partial pivoting: the
+  // row with the largest entry in the column (the first of equals) becomes the pivot row.
+  Row r0{m[0][0], m[0][1], m[0][2], rhs[0]};
+  Row r1{m[1][0], m[1][1], m[1][2], rhs[1]};
+  Row r2{m[2][0], m[2][1], m[2][2], rhs[2]};
+
+  ExchangeIf(std::fabs(r1.u) > std::fabs(r0.u), r0, r1);
+  ExchangeIf(std::fabs(r2.u) > std::fabs(r0.u), r0, r2);
+  if (!Usable(r0.u)) return false;
+  double scale = 1.0 / r0.u;
+  r0 = {1.0, r0.v * scale, r0.w * scale, r0.rhs * scale};
+  r1 = {0.0, r1.v - r1.u * r0.v, r1.w - r1.u * r0.w, r1.rhs - r1.u * r0.rhs};
+  r2 = {0.0, r2.v - r2.u * r0.v, r2.w - r2.u * r0.w, r2.rhs - r2.u * r0.rhs};
+
+  ExchangeIf(std::fabs(r2.v) > std::fabs(r1.v), r1, r2);
+  if (!Usable(r1.v)) return false;
+  scale = 1.0 / r1.v;
+  r1 = {0.0, 1.0, r1.w * scale, r1.rhs * scale};
+  r0 = {1.0, 0.0, r0.w - r0.v * r1.w, r0.rhs - r0.v * r1.rhs};
+  r2 = {0.0, 0.0, r2.w - r2.v * r1.w, r2.rhs - r2.v * r1.rhs};
+
+  if (!Usable(r2.w)) return false;
+  const double last = r2.rhs / r2.w;
+  v[0] = r0.rhs - r0.w * last;
+  v[1] = r1.rhs - r1.w * last;
+  v[2] = last;
   return true;
 }
 
@@ -77,7 +91,7 @@ void ApplyPhaseFit(int n, const double* x, const TsComplex* data, int newCount,
       m[j][2] = 1.0;
       rhs[j] = phase[i - 1 + j];
     }
-    if (SolveByInverse3x3(m, rhs, v)) fits[i] = {v[0], v[1], v[2], true};
+    if (Solve3x3(m, rhs, v)) fits[i] = {v[0], v[1], v[2], true};
   }
 
   std::ptrdiff_t p = 0;

@@ -7,10 +7,10 @@
 
 namespace LumenUtility {
 
-// Solves the 3x3 system m * v = rhs by inverting m (Gauss-Jordan elimination with partial
-// pivoting) and multiplying. Returns false, leaving v unwritten, when the largest pivot
-// available at some step is below 10000 * DBL_EPSILON in magnitude.
-bool SolveByInverse3x3(const double m[3][3], const double rhs[3], double v[3]);
+// Solves the 3x3 system m * v = rhs by Gauss-Jordan elimination with partial pivoting.
+// Returns false, leaving v unwritten, when the largest pivot available at some step is below
+// 10000 * DBL_EPSILON in magnitude.
+bool Solve3x3(const double m[3][3], const double rhs[3], double v[3]);
 
 // Rewrites the phase of newData[0 .. newCount - 1] (magnitudes kept). Old stimulus `x`
 // ascends (NaN tolerated: it only spoils nearby fits), `data` holds its n values. A new point

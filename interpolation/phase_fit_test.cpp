@@ -10,19 +10,19 @@
 namespace LumenUtility {
 namespace {
 
-TEST(SolveByInverse3x3, PivotsPastAZeroAndReportsSingularSystems) {
+TEST(Solve3x3, PivotsPastAZeroAndReportsSingularSystems) {
   // A zero in the first pivot position needs a row swap. Solution (1, 2, 3).
   const double m[3][3] = {{0, 2, 1}, {1, 1, 1}, {4, 2, 1}};
   const double b[3] = {0 + 4 + 3, 1 + 2 + 3, 4 + 4 + 3};
   double v[3] = {-1, -1, -1};
-  ASSERT_TRUE(SolveByInverse3x3(m, b, v));
+  ASSERT_TRUE(Solve3x3(m, b, v));
   EXPECT_NEAR(v[0], 1, 1e-12);
   EXPECT_NEAR(v[1], 2, 1e-12);
   EXPECT_NEAR(v[2], 3, 1e-12);
 
   const double singular[3][3] = {{1, 2, 3}, {2, 4, 6}, {0, 1, 1}};
   double untouched[3] = {7, 7, 7};
-  EXPECT_FALSE(SolveByInverse3x3(singular, b, untouched));
+  EXPECT_FALSE(Solve3x3(singular, b, untouched));
   EXPECT_EQ(untouched[0], 7);
 }
 
