@@ -184,6 +184,12 @@ TEST_F(SnPReaderTest, NoiseDataAfterTheMarkerBecomesThreeCustomTraces) {
   EXPECT_EQ(reader->GetParam(SNP_S21).GetName(), L"Noise Figure Cold Source:S21");
   EXPECT_EQ(reader->GetFileInfo().noisePoints, 2);
 
+  // The marker may stand anywhere after the option line, also before the network data.
+  const std::string early = Replace(Replace(kV1Noise, "! Noise Parameters\n", ""),
+                                    "R 50\n", "R 50\n! Noise Parameters follow the data\n");
+  ASSERT_EQ(Read(early), 2);
+  EXPECT_EQ(reader->GetNumCustomParams(), 3);
+
   // Without the marker the drop in frequency is one more network point.
   EXPECT_EQ(Read(std::string(kV1TwoPort) + "1.5 0.5 0 0.1 90 0.2 0 0.4 45\n"), 3);
   EXPECT_EQ(reader->GetNumCustomParams(), 0);

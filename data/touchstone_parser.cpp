@@ -5,6 +5,9 @@
 namespace LumenUtility {
 namespace {
 
+// A comment holding this text (case as written) announces noise data in a version 1 file.
+constexpr std::string_view kNoiseMarker = "Noise Parameters";
+
 std::string Quote(std::string_view token) {
   // Long tokens are cut: an error message names the culprit, it does not reprint the file.
   constexpr std::size_t kShown = 40;
@@ -132,7 +135,7 @@ bool TouchstoneParser::KeywordInteger(const std::string& name, int& value) {
 }
 
 bool TouchstoneParser::ReadKeywords() {
-  while (m_scanner.PeekLineStart() == '[') {
+  while (m_scanner.PeekLineStart(kNoiseMarker, &m_noiseMarked) == '[') {
     std::string name;
     if (!m_scanner.ReadKeyword(name)) return Fail("keyword without a closing ']'");
     if (name == "NETWORK DATA") {
@@ -205,13 +208,12 @@ bool TouchstoneParser::ReadNetworkData() {
   const long long n = c.ports;
   c.pairsPerPoint = static_cast<int>(triangle ? n * (n + 1) / 2 : n * n);
   const int valuesPerPoint = 2 * c.pairsPerPoint;
-  bool noiseMarked = false;
   for (;;) {
     const std::string_view token = m_scanner.NextToken();
     if (token.empty()) return true;
     if (token.front() == '!') {
       const std::string_view comment = m_scanner.CommentText(token);
-      if (comment.find("Noise Parameters") != std::string_view::npos) noiseMarked = true;
+      if (comment.find(kNoiseMarker) != std::string_view::npos) m_noiseMarked = true;
       continue;
     }
     if (token.front() == '[') {
@@ -225,7 +227,7 @@ bool TouchstoneParser::ReadNetworkData() {
       return Fail(Quote(token) + " is not a number (a stimulus value was expected)");
     }
     stimulus *= c.info.stimulusMultiplier;
-    if (c.ports == 2 && noiseMarked && !c.stimulus.empty() && stimulus <= c.stimulus.back()) {
+    if (c.ports == 2 && m_noiseMarked && !c.stimulus.empty() && stimulus <= c.stimulus.back()) {
       return ReadNoiseData(true);
     }
     if (!ReadRecordValues(valuesPerPoint, m_scanner.Line(), "data point", c.values)) {

@@ -59,6 +59,9 @@ class TouchstoneParser {
   TouchstoneScanner m_scanner;
   TouchstoneContent* m_content = nullptr;
   std::string m_error;
+  // A "Noise Parameters" comment was met after the option line: a two-port file's data may
+  // end in noise records.
+  bool m_noiseMarked = false;
 };
 
 }  // namespace LumenUtility

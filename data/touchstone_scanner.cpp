@@ -56,7 +56,7 @@ bool ParseStreamFloating(std::string_view token, T& value) {
 
 }  // namespace
 
-char TouchstoneScanner::PeekLineStart() {
+char TouchstoneScanner::PeekLineStart(std::string_view marker, bool* marked) {
   while (m_pos != m_end) {
     while (m_pos != m_end && IsBlank(*m_pos)) ++m_pos;
     if (m_pos == m_end) break;
@@ -66,7 +66,10 @@ char TouchstoneScanner::PeekLineStart() {
       continue;
     }
     if (*m_pos == '!') {
-      SkipLine();
+      const std::string_view comment = RestOfLine();
+      if (marked && !marker.empty() && comment.find(marker) != std::string_view::npos) {
+        *marked = true;
+      }
       continue;
     }
     return *m_pos;

@@ -22,7 +22,8 @@ class TouchstoneScanner {
 
   // Moves past blank lines and comment lines ("!" first after leading blanks) to the first
   // non-blank character of the next meaningful line and returns it; '\0' at end of text.
-  char PeekLineStart();
+  // `*marked` becomes true when a skipped comment contains `marker`.
+  char PeekLineStart(std::string_view marker = {}, bool* marked = nullptr);
   // Moves to the start of the next line.
   void SkipLine();
   // The text from the current position to the end of its line (without the line break);

@@ -2,6 +2,7 @@
 
 #include <charconv>
 #include <cmath>
+#include <string>
 
 namespace lumenutil {
 namespace {
@@ -53,8 +54,22 @@ std::optional<double> ParseEngineeringValue(std::string_view text, std::string_v
   if (multiplier == 0) return std::nullopt;
   rest.remove_prefix(length);
   if (!rest.empty() && !EqualsIgnoringCase(rest, unit)) return std::nullopt;
-  value *= multiplier;
-  if (!std::isfinite(value)) return std::nullopt;
+  // The prefix joins the decimal exponent and the text is read again, so "5u" is exactly
+  // the double nearest 5e-6, which 5 * 1e-6 is not.
+  const std::string_view number(text.data(), static_cast<std::size_t>(r.ptr - text.data()));
+  const std::size_t e = number.find_first_of("eE");
+  int exponent = static_cast<int>(std::lround(std::log10(multiplier)));
+  if (e != std::string_view::npos) {
+    int own = 0;
+    std::string_view digits = number.substr(e + 1);
+    if (!digits.empty() && digits.front() == '+') digits.remove_prefix(1);
+    std::from_chars(digits.data(), digits.data() + digits.size(), own);
+    exponent += own;
+  }
+  const std::string scaled = std::string(number.substr(0, e)) + "e" + std::to_string(exponent);
+  const std::from_chars_result again =
+      std::from_chars(scaled.data(), scaled.data() + scaled.size(), value);
+  if (again.ec != std::errc() || !std::isfinite(value)) return std::nullopt;
   return value;
 }
 
