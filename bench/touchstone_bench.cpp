@@ -140,15 +140,23 @@ void ReadFile(benchmark::State& state, const GeneratedFile& file, int ports) {
   state.counters["share_of_ceiling"] = megabytesPerSecond / ceiling;
 }
 
-void BM_ReadSNPFile_TwoPortV1(benchmark::State& state) { ReadFile(state, TwoPortFile(), 2); }
-void BM_ReadSNPFile_FourPortV2(benchmark::State& state) { ReadFile(state, FourPortFile(), 4); }
+void BM_ReadSNPFile_TwoPortV1(benchmark::State& state) {
+  ReadFile(state, TwoPortFile(), 2);
+}
+void BM_ReadSNPFile_FourPortV2(benchmark::State& state) {
+  ReadFile(state, FourPortFile(), 4);
+}
 
 void Ceiling(benchmark::State& state, const GeneratedFile& file) {
   for (auto _ : state) benchmark::DoNotOptimize(FromCharsPass(file.text));
   state.SetBytesProcessed(static_cast<std::int64_t>(state.iterations() * file.text.size()));
 }
-void BM_FromChars_TwoPortV1(benchmark::State& state) { Ceiling(state, TwoPortFile()); }
-void BM_FromChars_FourPortV2(benchmark::State& state) { Ceiling(state, FourPortFile()); }
+void BM_FromChars_TwoPortV1(benchmark::State& state) {
+  Ceiling(state, TwoPortFile());
+}
+void BM_FromChars_FourPortV2(benchmark::State& state) {
+  Ceiling(state, FourPortFile());
+}
 
 // The two-port file's four traces carried onto 100,001 new points that fall between the old
 // ones, by circular interpolation.
@@ -188,7 +196,8 @@ BENCHMARK(BM_InterpolateReadSNPFile_TwoPort)->Unit(benchmark::kMillisecond);
 struct Cleanup {
   ~Cleanup() {
     for (const char* name : {"two_port.s2p", "four_port.s4p"}) {
-      std::remove(("/tmp/lumen_touchstone_bench_" + std::to_string(::getpid()) + "_" + name).c_str());
+      std::remove(
+          ("/tmp/lumen_touchstone_bench_" + std::to_string(::getpid()) + "_" + name).c_str());
     }
   }
 } cleanup;

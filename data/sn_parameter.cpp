@@ -29,8 +29,8 @@ TsComplex CSNParameter::FromPair(float a, float b, ESNPForm form) {
   return TsComplex();
 }
 
-void CSNParameter::LoadSNP(std::vector<float>& a, std::vector<float>& b,
-                           const InputArray& stimulus, ESNPForm form) {
+void CSNParameter::LoadSNP(std::vector<float>& a, std::vector<float>& b, const InputArray& stimulus,
+                           ESNPForm form) {
   m_stimulus = stimulus;
   if (form != SNP_RI && form != SNP_MA && form != SNP_DB) return;
   const std::size_t count = std::min({m_data.size(), a.size(), b.size()});
@@ -44,10 +44,10 @@ void CSNParameter::Interpolate(const InputArray& stimulus, bool reset) {
   std::vector<TsComplex> out(stimulus.size());
   bool interpolated = false;
   // Out of range leaves `out` at zeros, which is what the trace then holds.
-  LumenUtility::CircularInterpolation(
-      static_cast<std::int32_t>(oldCount), m_stimulus.GetRawArray(), &m_data[0].re,
-      static_cast<std::int32_t>(stimulus.size()), stimulus.GetRawArray(), &out[0].re,
-      &interpolated, LumenUtility::INTERP_CIRCULAR);
+  LumenUtility::CircularInterpolation(static_cast<std::int32_t>(oldCount), m_stimulus.GetRawArray(),
+                                      &m_data[0].re, static_cast<std::int32_t>(stimulus.size()),
+                                      stimulus.GetRawArray(), &out[0].re, &interpolated,
+                                      LumenUtility::INTERP_CIRCULAR);
   std::wstring name = std::move(m_name);
   if (reset) *this = CSNParameter(stimulus);
   m_data = std::move(out);

@@ -19,12 +19,14 @@ const char kArc[] = "# GHz S MA R 50\n1 0.5 0\n2 0.5 30\n3 0.5 60\n";
 
 CSnPFileBase ReadOnePort(const std::string& text) {
   CSnPFileBase file(1);
-  EXPECT_GT(file.ReadSNPText(text), 0) << std::string(file.GetReadError().begin(),
-                                                      file.GetReadError().end());
+  EXPECT_GT(file.ReadSNPText(text), 0)
+      << std::string(file.GetReadError().begin(), file.GetReadError().end());
   return file;
 }
 
-const CSNParameter& S11(const CSnPFileBase& file) { return file.GetParam(SNP_S11); }
+const CSNParameter& S11(const CSnPFileBase& file) {
+  return file.GetParam(SNP_S11);
+}
 
 void ExpectPolar(TsComplex v, double magnitude, double degrees, double tolerance) {
   EXPECT_NEAR(v.re, magnitude * std::cos(degrees * kDegree), tolerance);

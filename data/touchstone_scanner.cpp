@@ -10,9 +10,15 @@ namespace LumenUtility {
 namespace {
 
 // The C locale's white space, which is what a stream skips between tokens.
-inline bool IsSpace(char c) { return c == ' ' || (c >= '\t' && c <= '\r'); }
-inline bool IsBlank(char c) { return c == ' ' || c == '\t' || c == '\r' || c == '\v' || c == '\f'; }
-inline bool IsDigit(char c) { return c >= '0' && c <= '9'; }
+inline bool IsSpace(char c) {
+  return c == ' ' || (c >= '\t' && c <= '\r');
+}
+inline bool IsBlank(char c) {
+  return c == ' ' || c == '\t' || c == '\r' || c == '\v' || c == '\f';
+}
+inline bool IsDigit(char c) {
+  return c >= '0' && c <= '9';
+}
 
 // Strips a stream-style leading '+' and rejects what a stream would not start a number with
 // (from_chars alone would also take "inf", "nan" and a doubled sign after the '+').
@@ -28,9 +34,13 @@ bool PrepareNumber(std::string_view& token) {
 template <typename T>
 T StrToFloating(const char* text, char** end);
 template <>
-double StrToFloating<double>(const char* text, char** end) { return std::strtod(text, end); }
+double StrToFloating<double>(const char* text, char** end) {
+  return std::strtod(text, end);
+}
 template <>
-float StrToFloating<float>(const char* text, char** end) { return std::strtof(text, end); }
+float StrToFloating<float>(const char* text, char** end) {
+  return std::strtof(text, end);
+}
 
 template <typename T>
 bool ParseStreamFloating(std::string_view token, T& value) {
@@ -77,7 +87,9 @@ char TouchstoneScanner::PeekLineStart(std::string_view marker, bool* marked) {
   return '\0';
 }
 
-void TouchstoneScanner::SkipLine() { RestOfLine(); }
+void TouchstoneScanner::SkipLine() {
+  RestOfLine();
+}
 
 std::string_view TouchstoneScanner::RestOfLine() {
   const char* start = m_pos;

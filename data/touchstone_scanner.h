@@ -14,7 +14,8 @@ namespace LumenUtility {
 
 class TouchstoneScanner {
  public:
-  explicit TouchstoneScanner(std::string_view text) : m_pos(text.data()), m_end(text.data() + text.size()) {}
+  explicit TouchstoneScanner(std::string_view text)
+      : m_pos(text.data()), m_end(text.data() + text.size()) {}
 
   // 1-based line number of the current position.
   int Line() const { return m_line; }

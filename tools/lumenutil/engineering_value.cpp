@@ -25,15 +25,25 @@ double Prefix(std::string_view rest, std::size_t& length) {
     return 1e-6;
   }
   switch (rest.front()) {
-    case 'p': return 1e-12;
-    case 'n': return 1e-9;
-    case 'u': return 1e-6;
-    case 'm': return 1e-3;
-    case 'k': case 'K': return 1e3;
-    case 'M': return 1e6;
-    case 'G': return 1e9;
-    case 'T': return 1e12;
-    default: return 0;
+    case 'p':
+      return 1e-12;
+    case 'n':
+      return 1e-9;
+    case 'u':
+      return 1e-6;
+    case 'm':
+      return 1e-3;
+    case 'k':
+    case 'K':
+      return 1e3;
+    case 'M':
+      return 1e6;
+    case 'G':
+      return 1e9;
+    case 'T':
+      return 1e12;
+    default:
+      return 0;
   }
 }
 

@@ -48,8 +48,7 @@ void Resample(const ResampleOptions& options) {
   const int outputPorts = SnPPortCountFromFileName(LumenUtility::Utf8ToWide(options.output));
   if (outputPorts > 0 && outputPorts != file.GetSNPType()) {
     throw std::runtime_error(options.output + " names " + std::to_string(outputPorts) +
-                             " ports, but the network has " +
-                             std::to_string(file.GetSNPType()));
+                             " ports, but the network has " + std::to_string(file.GetSNPType()));
   }
   const CSNParameter& s11 = file.GetParam(SNP_S11);
   if (s11.GetNumPoints() == 0) throw std::runtime_error(options.path + ": no data points");
@@ -57,24 +56,23 @@ void Resample(const ResampleOptions& options) {
                           options.log ? LumenUtility::Log : LumenUtility::Linear);
   const double low = std::min(start, stop), high = std::max(start, stop);
   if (!options.holdEnds && (low < s11.GetStartFreq() || high > s11.GetStopFreq())) {
-    throw std::runtime_error(
-        "the new sweep " + WithUnit(low, axis.unit, axis.siPrefix) + " to " +
-        WithUnit(high, axis.unit, axis.siPrefix) + " reaches outside the file's " +
-        WithUnit(s11.GetStartFreq(), axis.unit, axis.siPrefix) + " to " +
-        WithUnit(s11.GetStopFreq(), axis.unit, axis.siPrefix) +
-        "; --hold-ends extends each trace with its end values");
+    throw std::runtime_error("the new sweep " + WithUnit(low, axis.unit, axis.siPrefix) + " to " +
+                             WithUnit(high, axis.unit, axis.siPrefix) +
+                             " reaches outside the file's " +
+                             WithUnit(s11.GetStartFreq(), axis.unit, axis.siPrefix) + " to " +
+                             WithUnit(s11.GetStopFreq(), axis.unit, axis.siPrefix) +
+                             "; --hold-ends extends each trace with its end values");
   }
   if (options.holdEnds) file.ExtroplateReadSNPFile(target);
   file.InterpolateReadSNPFile(target, true);
 
   std::ofstream out(options.output, std::ios::binary);
   if (!out) throw std::runtime_error(options.output + ": cannot be written");
-  const std::string comment = "Resampled by lumenutil from " + options.path + " onto " +
-                              std::to_string(options.points) +
-                              (options.log ? " logarithmic" : " linear") + " points, " +
-                              WithUnit(start, axis.unit, axis.siPrefix) + " to " +
-                              WithUnit(stop, axis.unit, axis.siPrefix) +
-                              (options.holdEnds ? ", end values held" : "");
+  const std::string comment =
+      "Resampled by lumenutil from " + options.path + " onto " + std::to_string(options.points) +
+      (options.log ? " logarithmic" : " linear") + " points, " +
+      WithUnit(start, axis.unit, axis.siPrefix) + " to " +
+      WithUnit(stop, axis.unit, axis.siPrefix) + (options.holdEnds ? ", end values held" : "");
   WriteTouchstoneV1(file, comment, out, std::cerr);
   if (!out.flush()) throw std::runtime_error(options.output + ": writing failed");
 }
@@ -82,9 +80,10 @@ void Resample(const ResampleOptions& options) {
 }  // namespace
 
 void AddSnpResampleCommand(CLI::App& snp) {
-  CLI::App* command = snp.add_subcommand(
-      "resample", "Carry every trace of a Touchstone file onto a new linear or logarithmic "
-                  "sweep by circular interpolation and write a Touchstone version 1 file");
+  CLI::App* command =
+      snp.add_subcommand("resample",
+                         "Carry every trace of a Touchstone file onto a new linear or logarithmic "
+                         "sweep by circular interpolation and write a Touchstone version 1 file");
   auto options = std::make_shared<ResampleOptions>();
   command->add_option("FILE", options->path, "Touchstone file")->required();
   command->add_option("--start", options->start, "first stimulus value, e.g. 1.5e9, 1.5G or 1.5GHz")
@@ -98,8 +97,9 @@ void AddSnpResampleCommand(CLI::App& snp) {
                     "where the sweep reaches beyond the file, hold each trace's end values");
   command->add_option("--output,-o", options->output, "Touchstone file to write (OUT.sNp)")
       ->required();
-  command->add_option("--ports", options->ports,
-                      "port count of a version 1 file whose name does not end in .sNp")
+  command
+      ->add_option("--ports", options->ports,
+                   "port count of a version 1 file whose name does not end in .sNp")
       ->check(CLI::Range(1, CSnPFileBase::kMaxPorts));
   command->callback([options] { Resample(*options); });
 }

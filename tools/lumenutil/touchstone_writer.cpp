@@ -13,10 +13,14 @@ namespace {
 
 const char* UnitToken(ResultType type) {
   switch (type) {
-    case RESULT_SEC: return "SEC";
-    case RESULT_DBM: return "DBM";
-    case RESULT_POINT: return "POINT";
-    default: return "HZ";
+    case RESULT_SEC:
+      return "SEC";
+    case RESULT_DBM:
+      return "DBM";
+    case RESULT_POINT:
+      return "POINT";
+    default:
+      return "HZ";
   }
 }
 

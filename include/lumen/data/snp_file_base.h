@@ -19,12 +19,12 @@
 
 // Facts about the last file read successfully, beyond its traces.
 struct SnPFileInfo {
-  int version = 0;                    // 1 or 2; 0 before the first successful read
-  std::string stimulusUnit = "GHZ";   // the option line's unit token, upper case
-  double stimulusMultiplier = 1e9;    // stimulus unit of the file, in Hz (1 for SEC, DBM...)
-  char parameter = 'S';               // S, Y, Z, H or G as the option line names it
+  int version = 0;                   // 1 or 2; 0 before the first successful read
+  std::string stimulusUnit = "GHZ";  // the option line's unit token, upper case
+  double stimulusMultiplier = 1e9;   // stimulus unit of the file, in Hz (1 for SEC, DBM...)
+  char parameter = 'S';              // S, Y, Z, H or G as the option line names it
   ESNPForm form = SNP_MA;
-  double referenceResistance = 50.0;  // ohms, the option line's R
+  double referenceResistance = 50.0;   // ohms, the option line's R
   std::vector<double> portReferences;  // ohms per port from [Reference]; empty without it
   SnPMatrixFormat matrixFormat = SNP_MATRIX_FULL;
   int declaredFrequencies = 0;  // [Number of Frequencies]; 0 when absent
