@@ -197,6 +197,7 @@ TEST_F(SnPReaderTest, NoiseDataAfterTheMarkerBecomesThreeCustomTraces) {
 
   // Version 2 marks its noise data with a keyword.
   std::string v2 = Replace(kV2TwoPort, "[End]\n", "[Noise Data]\n1 3 0.5 45 0.2\n[End]\n");
+  v2 = Replace(v2, "[Network Data]", "[Number of Noise Frequencies] 1\n[Network Data]");
   ASSERT_EQ(Read(v2), 2) << Error();
   EXPECT_EQ(reader->GetNumCustomParams(), 3);
   EXPECT_EQ(reader->GetFileInfo().noisePoints, 1);
