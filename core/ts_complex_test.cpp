@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include "core/test_util.h"
+
 #include <cmath>
 #include <cstring>
 #include <limits>
@@ -9,17 +11,9 @@
 namespace LumenUtility {
 namespace {
 
+using testutil::ZeroValueGuard;
+
 constexpr double kPi = 3.14159265358979323846;
-
-// Restores the process-wide zero value however a test ends.
-class ZeroValueGuard {
- public:
-  ZeroValueGuard() : m_saved(TsComplex::GetLogMagZeroValue()) {}
-  ~ZeroValueGuard() { TsComplex::SetLogMagZeroValue(m_saved); }
-
- private:
-  double m_saved;
-};
 
 TEST(TsComplex, LayoutIsTwoFloatsRealFirst) {
   const TsComplex values[2] = {TsComplex(1.5, -2.5), TsComplex(3.0, 4.0)};

@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <cmath>
 
+#include "interpolation/gallop_search.h"
+
 namespace LumenUtility {
 
 MonotonicLocator::MonotonicLocator(const InputArray& stimulus)
@@ -81,7 +83,8 @@ double MonotonicLocator::FindInArbitrary(const Piece& piece, double value) {
   const double key = Key(value);
   const auto count = static_cast<std::ptrdiff_t>(piece.count);
   if (!(key >= Key(p[0]) && key <= Key(p[count - 1]))) return -1.0;
-  std::ptrdiff_t i = UpperBound(p, count, key) - 1;
+  std::ptrdiff_t i =
+      GallopBoundary(count, m_hint, [&](std::ptrdiff_t k) { return Key(p[k]) > key; }) - 1;
   m_hint = i;
   if (i == count - 1) {
     i = piece.lastStep;
@@ -91,39 +94,6 @@ double MonotonicLocator::FindInArbitrary(const Piece& piece, double value) {
   if (r >= 0.0 && r <= 1.0) return piece.base + (static_cast<double>(i) + r);
   ++m_fallbacks;
   return piece.base + piece.segment->Find(value, false);
-}
-
-std::ptrdiff_t MonotonicLocator::UpperBound(const double* p, std::ptrdiff_t count,
-                                            double key) const {
-  const auto above = [&](std::ptrdiff_t i) { return Key(p[i]) > key; };
-  // Gallop from the hint to a bracket [low, high) with p[low] not above and p[high] above the
-  // key (low = -1, high = count standing for the ends), then bisect it.
-  std::ptrdiff_t low = -1, high = count;
-  const std::ptrdiff_t hint = std::clamp<std::ptrdiff_t>(m_hint, 0, count - 1);
-  if (!above(hint)) {
-    low = hint;
-    for (std::ptrdiff_t step = 1; low + step < count; step *= 2) {
-      if (above(low + step)) {
-        high = low + step;
-        break;
-      }
-      low += step;
-    }
-  } else {
-    high = hint;
-    for (std::ptrdiff_t step = 1; high - step >= 0; step *= 2) {
-      if (!above(high - step)) {
-        low = high - step;
-        break;
-      }
-      high -= step;
-    }
-  }
-  while (high - low > 1) {
-    const std::ptrdiff_t mid = low + (high - low) / 2;
-    (above(mid) ? high : low) = mid;
-  }
-  return high;
 }
 
 }  // namespace LumenUtility

@@ -54,8 +54,6 @@ class MonotonicLocator {
   // Candidate of one piece, or a negative number when the piece does not reach the value.
   double Offer(const Piece& piece, double value);
   double FindInArbitrary(const Piece& piece, double value);
-  // First point in p[0 .. count - 1] whose key exceeds `key`, searched outward from m_hint.
-  std::ptrdiff_t UpperBound(const double* p, std::ptrdiff_t count, double key) const;
 
   const double* m_points;
   unsigned int m_size;

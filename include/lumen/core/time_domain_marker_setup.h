@@ -1,7 +1,8 @@
 // Interface::ITimeDomainMarkerSetup: the settings by which time-domain markers show distance.
 //
 // Only the enumerations are defined here; they select how Time2Distance and Distance2Time
-// convert between a marker's time and the length of line it corresponds to.
+// convert between a marker's time and the length of line it corresponds to. The class holds
+// no state and is never instantiated by the library.
 #pragma once
 
 namespace Interface {
