@@ -29,8 +29,7 @@ struct FileCloser {
 // triangular layout of n ports; the other triangle mirrors the stored one.
 int TriangleIndex(SnPMatrixFormat format, int n, int row, int column) {
   if (format == SNP_MATRIX_LOWER) {
-    return column <= row ? (row - 1) * row / 2 + column - 1
-                         : (column - 1) * column / 2 + row - 1;
+    return column <= row ? (row - 1) * row / 2 + column - 1 : (column - 1) * column / 2 + row - 1;
   }
   return row <= column ? (row - 1) * n - row * (row - 1) / 2 + column - 1
                        : (column - 1) * n - column * (column - 1) / 2 + row - 1;
@@ -52,7 +51,8 @@ int CSnPFileBase::ReadSNPFile(const std::wstring& path) {
   const std::string narrowPath = LumenUtility::WideToUtf8(path);
   std::unique_ptr<std::FILE, FileCloser> file(std::fopen(narrowPath.c_str(), "rb"));
   if (!file) {
-    m_readError = L"line 0: cannot open the file: " + LumenUtility::Utf8ToWide(std::strerror(errno));
+    m_readError =
+        L"line 0: cannot open the file: " + LumenUtility::Utf8ToWide(std::strerror(errno));
     return -1;
   }
   std::string text;
@@ -69,7 +69,8 @@ int CSnPFileBase::ReadSNPFile(const std::wstring& path) {
   }
   text.resize(used);
   if (std::ferror(file.get())) {
-    m_readError = L"line 0: the file cannot be read: " + LumenUtility::Utf8ToWide(std::strerror(errno));
+    m_readError =
+        L"line 0: the file cannot be read: " + LumenUtility::Utf8ToWide(std::strerror(errno));
     return -1;
   }
   return ReadSNPText(text);
@@ -124,9 +125,9 @@ int CSnPFileBase::ReadSNPText(std::string_view text) {
   for (int k = 0; k < n * n; ++k) {
     const int row = k / n + 1;
     const int column = k % n + 1;
-    const std::size_t source = format == SNP_MATRIX_FULL
-                                   ? static_cast<std::size_t>(k)
-                                   : static_cast<std::size_t>(TriangleIndex(format, n, row, column));
+    const std::size_t source =
+        format == SNP_MATRIX_FULL ? static_cast<std::size_t>(k)
+                                  : static_cast<std::size_t>(TriangleIndex(format, n, row, column));
     CSNParameter trace(stimulus);
     trace.SetStimulus(stimulus);
     std::vector<LumenUtility::TsComplex>& data = trace.GetData();

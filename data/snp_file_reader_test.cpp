@@ -41,7 +41,8 @@ class SnPReaderTest : public ::testing::Test {
  protected:
   int Read(const std::string& text, int ports = 2) {
     const std::string path = ::testing::TempDir() + "snp_reader_" + std::to_string(::getpid()) +
-                             "_" + ::testing::UnitTest::GetInstance()->current_test_info()->name() + ".s2p";
+                             "_" + ::testing::UnitTest::GetInstance()->current_test_info()->name() +
+                             ".s2p";
     std::ofstream(path, std::ios::binary) << text;
     reader = std::make_unique<CSnPFileBase>(ports);
     const int points = reader->ReadSNPFile(std::wstring(path.begin(), path.end()));
@@ -112,7 +113,7 @@ TEST_F(SnPReaderTest, OptionLineSetsUnitFormResistanceAndResultType) {
     const char* option;
     double stimulus;  // of the data value 2
     ResultType result;
-  } cases[] = {{"#", 2e9, RESULT_FREQUENCY},       {"# hz ri", 2, RESULT_FREQUENCY},
+  } cases[] = {{"#", 2e9, RESULT_FREQUENCY},        {"# hz ri", 2, RESULT_FREQUENCY},
                {"# KHz RI", 2e3, RESULT_FREQUENCY}, {"# MHZ RI", 2e6, RESULT_FREQUENCY},
                {"# DBM RI", 2, RESULT_DBM},         {"# SEC RI", 2, RESULT_SEC},
                {"# POINT RI", 2, RESULT_POINT}};
@@ -184,12 +185,19 @@ TEST_F(SnPReaderTest, NoiseDataAfterTheMarkerBecomesThreeCustomTraces) {
   EXPECT_EQ(reader->GetParam(SNP_S21).GetName(), L"Noise Figure Cold Source:S21");
   EXPECT_EQ(reader->GetFileInfo().noisePoints, 2);
 
+  // The marker may stand anywhere after the option line, also before the network data.
+  const std::string early = Replace(Replace(kV1Noise, "! Noise Parameters\n", ""), "R 50\n",
+                                    "R 50\n! Noise Parameters follow the data\n");
+  ASSERT_EQ(Read(early), 2);
+  EXPECT_EQ(reader->GetNumCustomParams(), 3);
+
   // Without the marker the drop in frequency is one more network point.
   EXPECT_EQ(Read(std::string(kV1TwoPort) + "1.5 0.5 0 0.1 90 0.2 0 0.4 45\n"), 3);
   EXPECT_EQ(reader->GetNumCustomParams(), 0);
 
   // Version 2 marks its noise data with a keyword.
   std::string v2 = Replace(kV2TwoPort, "[End]\n", "[Noise Data]\n1 3 0.5 45 0.2\n[End]\n");
+  v2 = Replace(v2, "[Network Data]", "[Number of Noise Frequencies] 1\n[Network Data]");
   ASSERT_EQ(Read(v2), 2) << Error();
   EXPECT_EQ(reader->GetNumCustomParams(), 3);
   EXPECT_EQ(reader->GetFileInfo().noisePoints, 1);
@@ -266,8 +274,9 @@ TEST_F(SnPReaderTest, NumbersReadLikeAStream) {
 }
 
 TEST_F(SnPReaderTest, DeclaredFrequencyCountEndsTheNetworkData) {
-  std::string text = "[Version] 2.0\n# Hz RI\n[Number of Ports] 1\n[Number of Frequencies] 3\n"
-                     "[Network Data]\n1 1 0\n2 2 0\n3 3 0\n4 4 0\n5 5 0\n";
+  std::string text =
+      "[Version] 2.0\n# Hz RI\n[Number of Ports] 1\n[Number of Frequencies] 3\n"
+      "[Network Data]\n1 1 0\n2 2 0\n3 3 0\n4 4 0\n5 5 0\n";
   EXPECT_EQ(Read(text), 3);
   EXPECT_EQ(reader->GetParam(SNP_S11).GetStopFreq(), 3.0);
   // The count is never taken as a size to reserve.

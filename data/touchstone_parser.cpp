@@ -5,6 +5,9 @@
 namespace LumenUtility {
 namespace {
 
+// A comment holding this text (case as written) announces noise data in a version 1 file.
+constexpr std::string_view kNoiseMarker = "Noise Parameters";
+
 std::string Quote(std::string_view token) {
   // Long tokens are cut: an error message names the culprit, it does not reprint the file.
   constexpr std::size_t kShown = 40;
@@ -34,8 +37,7 @@ bool TouchstoneParser::Parse(TouchstoneContent& content) {
   if (m_ports < 1 || m_ports > CSnPFileBase::kMaxPorts) {
     return FailAtLine(0, "a network of " + std::to_string(m_ports) + " ports is not read");
   }
-  return ReadByteOrderMark() && ReadVersionAndOptionLine() && ReadKeywords() &&
-         ReadNetworkData();
+  return ReadByteOrderMark() && ReadVersionAndOptionLine() && ReadKeywords() && ReadNetworkData();
 }
 
 bool TouchstoneParser::ReadByteOrderMark() {
@@ -100,16 +102,18 @@ bool TouchstoneParser::ReadOptionLine(std::string_view line) {
     const std::string option = ToUpperAscii(token);
     if (option == "HZ" || option == "KHZ" || option == "MHZ" || option == "GHZ") {
       info.stimulusUnit = option;
-      info.stimulusMultiplier = option == "HZ" ? 1.0 : option == "KHZ" ? 1e3
-                                : option == "MHZ" ? 1e6 : 1e9;
+      info.stimulusMultiplier = option == "HZ"    ? 1.0
+                                : option == "KHZ" ? 1e3
+                                : option == "MHZ" ? 1e6
+                                                  : 1e9;
     } else if (option == "SEC" || option == "DBM" || option == "POINT") {
       info.stimulusUnit = option;
       info.stimulusMultiplier = 1.0;
       m_content->resultTypeGiven = true;
-      m_content->resultType = option == "SEC" ? RESULT_SEC : option == "DBM" ? RESULT_DBM
-                                                                              : RESULT_POINT;
-    } else if (option == "S" || option == "Y" || option == "Z" || option == "H" ||
-               option == "G") {
+      m_content->resultType = option == "SEC"   ? RESULT_SEC
+                              : option == "DBM" ? RESULT_DBM
+                                                : RESULT_POINT;
+    } else if (option == "S" || option == "Y" || option == "Z" || option == "H" || option == "G") {
       info.parameter = option[0];
     } else if (option == "RI" || option == "MA" || option == "DB") {
       info.form = option == "RI" ? SNP_RI : option == "MA" ? SNP_MA : SNP_DB;
@@ -132,7 +136,7 @@ bool TouchstoneParser::KeywordInteger(const std::string& name, int& value) {
 }
 
 bool TouchstoneParser::ReadKeywords() {
-  while (m_scanner.PeekLineStart() == '[') {
+  while (m_scanner.PeekLineStart(kNoiseMarker, &m_noiseMarked) == '[') {
     std::string name;
     if (!m_scanner.ReadKeyword(name)) return Fail("keyword without a closing ']'");
     if (name == "NETWORK DATA") {
@@ -169,8 +173,9 @@ bool TouchstoneParser::ReadKeywordValue(const std::string& name) {
     }
   } else if (name == "MATRIX FORMAT") {
     const std::string layout = ToUpperAscii(m_scanner.NextToken());
-    c.info.matrixFormat = layout == "LOWER" ? SNP_MATRIX_LOWER
-                          : layout == "UPPER" ? SNP_MATRIX_UPPER : SNP_MATRIX_FULL;
+    c.info.matrixFormat = layout == "LOWER"   ? SNP_MATRIX_LOWER
+                          : layout == "UPPER" ? SNP_MATRIX_UPPER
+                                              : SNP_MATRIX_FULL;
   }
   return true;
 }
@@ -181,8 +186,8 @@ bool TouchstoneParser::ReadRecordValues(int count, int recordLine, const char* w
     const std::string_view token = m_scanner.NextToken();
     if (token.empty()) {
       return Fail(std::string("the file ends inside the ") + what + " that starts at line " +
-                  std::to_string(recordLine) + ": " + std::to_string(count) +
-                  " values expected, " + std::to_string(read) + " found");
+                  std::to_string(recordLine) + ": " + std::to_string(count) + " values expected, " +
+                  std::to_string(read) + " found");
     }
     if (token.front() == '!') {
       m_scanner.CommentText(token);
@@ -205,13 +210,12 @@ bool TouchstoneParser::ReadNetworkData() {
   const long long n = c.ports;
   c.pairsPerPoint = static_cast<int>(triangle ? n * (n + 1) / 2 : n * n);
   const int valuesPerPoint = 2 * c.pairsPerPoint;
-  bool noiseMarked = false;
   for (;;) {
     const std::string_view token = m_scanner.NextToken();
     if (token.empty()) return true;
     if (token.front() == '!') {
       const std::string_view comment = m_scanner.CommentText(token);
-      if (comment.find("Noise Parameters") != std::string_view::npos) noiseMarked = true;
+      if (comment.find(kNoiseMarker) != std::string_view::npos) m_noiseMarked = true;
       continue;
     }
     if (token.front() == '[') {
@@ -225,7 +229,7 @@ bool TouchstoneParser::ReadNetworkData() {
       return Fail(Quote(token) + " is not a number (a stimulus value was expected)");
     }
     stimulus *= c.info.stimulusMultiplier;
-    if (c.ports == 2 && noiseMarked && !c.stimulus.empty() && stimulus <= c.stimulus.back()) {
+    if (c.ports == 2 && m_noiseMarked && !c.stimulus.empty() && stimulus <= c.stimulus.back()) {
       return ReadNoiseData(true);
     }
     if (!ReadRecordValues(valuesPerPoint, m_scanner.Line(), "data point", c.values)) {

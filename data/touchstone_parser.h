@@ -16,14 +16,14 @@ namespace LumenUtility {
 // What a file holds, before conversion into traces.
 struct TouchstoneContent {
   int ports = 2;
-  bool twoPortOrder21 = true;       // pairs 11, 21, 12, 22 in a two-port file
-  bool resultTypeGiven = false;     // the option line named SEC, DBM or POINT
+  bool twoPortOrder21 = true;    // pairs 11, 21, 12, 22 in a two-port file
+  bool resultTypeGiven = false;  // the option line named SEC, DBM or POINT
   ResultType resultType = RESULT_FREQUENCY;
   SnPFileInfo info;
   int pairsPerPoint = 0;
-  std::vector<double> stimulus;     // scaled to Hz (or the file's own unit), one per point
-  std::vector<float> values;        // pairsPerPoint (a, b) pairs per point, in file order
-  std::vector<float> noise;         // per noise record: 2*NFmin dB, |GammaOpt|, angle deg, Rn ohms
+  std::vector<double> stimulus;  // scaled to Hz (or the file's own unit), one per point
+  std::vector<float> values;     // pairsPerPoint (a, b) pairs per point, in file order
+  std::vector<float> noise;      // per noise record: 2*NFmin dB, |GammaOpt|, angle deg, Rn ohms
 };
 
 class TouchstoneParser {
@@ -59,6 +59,9 @@ class TouchstoneParser {
   TouchstoneScanner m_scanner;
   TouchstoneContent* m_content = nullptr;
   std::string m_error;
+  // A "Noise Parameters" comment was met after the option line: a two-port file's data may
+  // end in noise records.
+  bool m_noiseMarked = false;
 };
 
 }  // namespace LumenUtility

@@ -10,9 +10,15 @@ namespace LumenUtility {
 namespace {
 
 // The C locale's white space, which is what a stream skips between tokens.
-inline bool IsSpace(char c) { return c == ' ' || (c >= '\t' && c <= '\r'); }
-inline bool IsBlank(char c) { return c == ' ' || c == '\t' || c == '\r' || c == '\v' || c == '\f'; }
-inline bool IsDigit(char c) { return c >= '0' && c <= '9'; }
+inline bool IsSpace(char c) {
+  return c == ' ' || (c >= '\t' && c <= '\r');
+}
+inline bool IsBlank(char c) {
+  return c == ' ' || c == '\t' || c == '\r' || c == '\v' || c == '\f';
+}
+inline bool IsDigit(char c) {
+  return c >= '0' && c <= '9';
+}
 
 // Strips a stream-style leading '+' and rejects what a stream would not start a number with
 // (from_chars alone would also take "inf", "nan" and a doubled sign after the '+').
@@ -28,9 +34,13 @@ bool PrepareNumber(std::string_view& token) {
 template <typename T>
 T StrToFloating(const char* text, char** end);
 template <>
-double StrToFloating<double>(const char* text, char** end) { return std::strtod(text, end); }
+double StrToFloating<double>(const char* text, char** end) {
+  return std::strtod(text, end);
+}
 template <>
-float StrToFloating<float>(const char* text, char** end) { return std::strtof(text, end); }
+float StrToFloating<float>(const char* text, char** end) {
+  return std::strtof(text, end);
+}
 
 template <typename T>
 bool ParseStreamFloating(std::string_view token, T& value) {
@@ -56,7 +66,7 @@ bool ParseStreamFloating(std::string_view token, T& value) {
 
 }  // namespace
 
-char TouchstoneScanner::PeekLineStart() {
+char TouchstoneScanner::PeekLineStart(std::string_view marker, bool* marked) {
   while (m_pos != m_end) {
     while (m_pos != m_end && IsBlank(*m_pos)) ++m_pos;
     if (m_pos == m_end) break;
@@ -66,7 +76,10 @@ char TouchstoneScanner::PeekLineStart() {
       continue;
     }
     if (*m_pos == '!') {
-      SkipLine();
+      const std::string_view comment = RestOfLine();
+      if (marked && !marker.empty() && comment.find(marker) != std::string_view::npos) {
+        *marked = true;
+      }
       continue;
     }
     return *m_pos;
@@ -74,7 +87,9 @@ char TouchstoneScanner::PeekLineStart() {
   return '\0';
 }
 
-void TouchstoneScanner::SkipLine() { RestOfLine(); }
+void TouchstoneScanner::SkipLine() {
+  RestOfLine();
+}
 
 std::string_view TouchstoneScanner::RestOfLine() {
   const char* start = m_pos;

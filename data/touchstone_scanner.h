@@ -14,7 +14,8 @@ namespace LumenUtility {
 
 class TouchstoneScanner {
  public:
-  explicit TouchstoneScanner(std::string_view text) : m_pos(text.data()), m_end(text.data() + text.size()) {}
+  explicit TouchstoneScanner(std::string_view text)
+      : m_pos(text.data()), m_end(text.data() + text.size()) {}
 
   // 1-based line number of the current position.
   int Line() const { return m_line; }
@@ -22,7 +23,8 @@ class TouchstoneScanner {
 
   // Moves past blank lines and comment lines ("!" first after leading blanks) to the first
   // non-blank character of the next meaningful line and returns it; '\0' at end of text.
-  char PeekLineStart();
+  // `*marked` becomes true when a skipped comment contains `marker`.
+  char PeekLineStart(std::string_view marker = {}, bool* marked = nullptr);
   // Moves to the start of the next line.
   void SkipLine();
   // The text from the current position to the end of its line (without the line break);

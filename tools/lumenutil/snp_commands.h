@@ -8,5 +8,6 @@ namespace lumenutil {
 void AddSnpInfoCommand(CLI::App& snp);
 void AddSnpExportCommand(CLI::App& snp);
 void AddSnpPlotCommand(CLI::App& snp);
+void AddSnpResampleCommand(CLI::App& snp);
 
 }  // namespace lumenutil

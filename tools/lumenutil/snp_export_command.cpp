@@ -26,8 +26,8 @@ void WriteTable(const ExportOptions& options, std::ostream& out) {
   const CSnPFileBase file = ReadTouchstone(options.path, options.ports);
   const SnPFileInfo& info = file.GetFileInfo();
   const TraceFormat format = TraceFormatFromName(options.format);
-  if (info.parameter != 'S' && (format == TraceFormat::kSWR || format == TraceFormat::kZ ||
-                                format == TraceFormat::kY)) {
+  if (info.parameter != 'S' &&
+      (format == TraceFormat::kSWR || format == TraceFormat::kZ || format == TraceFormat::kY)) {
     std::cerr << "lumenutil snp export: warning: " << options.path << " holds " << info.parameter
               << "-parameters; " << options.format << " treats them as reflection coefficients\n";
   }
@@ -76,23 +76,26 @@ void Export(const ExportOptions& options) {
 
 void AddSnpExportCommand(CLI::App& snp) {
   CLI::App* command = snp.add_subcommand(
-      "export", "Write the traces of a Touchstone file as a table (CSV by default), one row "
-                "per stimulus point, numbers with enough digits to read back exactly");
+      "export",
+      "Write the traces of a Touchstone file as a table (CSV by default), one row "
+      "per stimulus point, numbers with enough digits to read back exactly");
   auto options = std::make_shared<ExportOptions>();
   command->add_option("FILE", options->path, "Touchstone file")->required();
   command->add_option("--params,-p", options->params,
                       "comma-separated traces, e.g. S21,S11 (default: all, in file order)");
-  command->add_option("--format,-f", options->format,
-                      "ri, ma (linear magnitude, degrees), db (dB, degrees), logmag, phase, "
-                      "uphase (unwrapped), swr, z (ohms), y (siemens)")
+  command
+      ->add_option("--format,-f", options->format,
+                   "ri, ma (linear magnitude, degrees), db (dB, degrees), logmag, phase, "
+                   "uphase (unwrapped), swr, z (ohms), y (siemens)")
       ->check(CLI::IsMember(TraceFormatNames()))
       ->capture_default_str();
   command->add_option("--delimiter,-d", options->delimiter, "column separator")
       ->capture_default_str();
   command->add_option("--limit,-n", options->limit, "only the first N points")
       ->check(CLI::NonNegativeNumber);
-  command->add_option("--ports", options->ports,
-                      "port count of a version 1 file whose name does not end in .sNp")
+  command
+      ->add_option("--ports", options->ports,
+                   "port count of a version 1 file whose name does not end in .sNp")
       ->check(CLI::Range(1, CSnPFileBase::kMaxPorts));
   command->add_option("--output,-o", options->output, "output file (default: standard output)");
   command->callback([options] { Export(*options); });

@@ -69,7 +69,8 @@ std::vector<MatrixPosition> SelectPositions(const std::string& list, const CSnPF
   if (list.empty()) {
     for (int k = 0; k < n * n; ++k) {
       const int index = static_cast<int>(&file.GetLoopParam(k) - &file.GetParam(SNP_S11));
-      positions.push_back({index / n + 1, index % n + 1, PositionName(index / n + 1, index % n + 1)});
+      positions.push_back(
+          {index / n + 1, index % n + 1, PositionName(index / n + 1, index % n + 1)});
     }
     return positions;
   }

@@ -81,12 +81,14 @@ void PrintInfo(const InfoOptions& options) {
 
 void AddSnpInfoCommand(CLI::App& snp) {
   CLI::App* command =
-      snp.add_subcommand("info", "Describe a Touchstone file: version, ports, points, "
-                                 "stimulus range, value form, reference, layout, noise data");
+      snp.add_subcommand("info",
+                         "Describe a Touchstone file: version, ports, points, "
+                         "stimulus range, value form, reference, layout, noise data");
   auto options = std::make_shared<InfoOptions>();
   command->add_option("FILE", options->path, "Touchstone file")->required();
-  command->add_option("--ports", options->ports,
-                      "port count of a version 1 file whose name does not end in .sNp")
+  command
+      ->add_option("--ports", options->ports,
+                   "port count of a version 1 file whose name does not end in .sNp")
       ->check(CLI::Range(1, CSnPFileBase::kMaxPorts));
   command->callback([options] { PrintInfo(*options); });
 }

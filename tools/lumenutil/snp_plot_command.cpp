@@ -91,8 +91,9 @@ void Plot(const PlotOptions& options) {
 
 void AddSnpPlotCommand(CLI::App& snp) {
   CLI::App* command = snp.add_subcommand(
-      "plot", "Draw the traces of a Touchstone file as an SVG picture: log magnitude or phase "
-              "over the stimulus, or reflections on a Smith chart");
+      "plot",
+      "Draw the traces of a Touchstone file as an SVG picture: log magnitude or phase "
+      "over the stimulus, or reflections on a Smith chart");
   auto options = std::make_shared<PlotOptions>();
   command->add_option("FILE", options->path, "Touchstone file")->required();
   command->add_option("--output,-o", options->output, "SVG file to write")->required();
@@ -102,8 +103,9 @@ void AddSnpPlotCommand(CLI::App& snp) {
   command->add_option("--params,-p", options->params,
                       "comma-separated traces, e.g. S21,S11 (default: all; for smith, the "
                       "reflections S11, S22, ...)");
-  command->add_option("--ports", options->ports,
-                      "port count of a version 1 file whose name does not end in .sNp")
+  command
+      ->add_option("--ports", options->ports,
+                   "port count of a version 1 file whose name does not end in .sNp")
       ->check(CLI::Range(1, CSnPFileBase::kMaxPorts));
   command->callback([options] { Plot(*options); });
 }

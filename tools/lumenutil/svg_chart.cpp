@@ -18,7 +18,9 @@ constexpr double kLeft = 90, kRight = 180, kTop = 50, kBottom = 70;
 const char* const kColours[] = {"#1f5fa8", "#c8332b", "#2a8a3e", "#e08a0b", "#7b4bb0",
                                 "#8c564b", "#d1489c", "#5f6b73", "#9a9a16", "#15a3b5"};
 
-std::string Colour(std::size_t i) { return kColours[i % (sizeof kColours / sizeof *kColours)]; }
+std::string Colour(std::size_t i) {
+  return kColours[i % (sizeof kColours / sizeof *kColours)];
+}
 
 std::string Num(double v) {
   char text[32];
@@ -30,11 +32,20 @@ std::string Escape(const std::string& text) {
   std::string out;
   for (char c : text) {
     switch (c) {
-      case '&': out += "&amp;"; break;
-      case '<': out += "&lt;"; break;
-      case '>': out += "&gt;"; break;
-      case '"': out += "&quot;"; break;
-      default: out += c;
+      case '&':
+        out += "&amp;";
+        break;
+      case '<':
+        out += "&lt;";
+        break;
+      case '>':
+        out += "&gt;";
+        break;
+      case '"':
+        out += "&quot;";
+        break;
+      default:
+        out += c;
     }
   }
   return out;
@@ -42,8 +53,8 @@ std::string Escape(const std::string& text) {
 
 std::string Text(double x, double y, const std::string& text, const char* anchor,
                  const char* extra = "") {
-  return "<text x=\"" + Num(x) + "\" y=\"" + Num(y) + "\" text-anchor=\"" + anchor + "\"" +
-         extra + ">" + Escape(text) + "</text>\n";
+  return "<text x=\"" + Num(x) + "\" y=\"" + Num(y) + "\" text-anchor=\"" + anchor + "\"" + extra +
+         ">" + Escape(text) + "</text>\n";
 }
 
 std::string Line(double x1, double y1, double x2, double y2, const char* style) {
@@ -53,8 +64,9 @@ std::string Line(double x1, double y1, double x2, double y2, const char* style) 
 
 std::string Header(double width, double height, const std::string& title) {
   return "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n"
-         "<svg xmlns=\"http://www.w3.org/2000/svg\" width=\"" + Num(width) + "\" height=\"" +
-         Num(height) + "\" viewBox=\"0 0 " + Num(width) + " " + Num(height) +
+         "<svg xmlns=\"http://www.w3.org/2000/svg\" width=\"" +
+         Num(width) + "\" height=\"" + Num(height) + "\" viewBox=\"0 0 " + Num(width) + " " +
+         Num(height) +
          "\" font-family=\"DejaVu Sans, Arial, sans-serif\" font-size=\"13\">\n"
          "<rect width=\"100%\" height=\"100%\" fill=\"white\"/>\n" +
          Text(width / 2, 28, title, "middle", " font-size=\"16\" font-weight=\"bold\"");
@@ -64,8 +76,8 @@ std::string Legend(const std::vector<ChartSeries>& series, double x, double y) {
   std::string svg;
   for (std::size_t i = 0; i < series.size(); ++i) {
     const double rowY = y + 22.0 * i;
-    svg += "<line x1=\"" + Num(x) + "\" y1=\"" + Num(rowY) + "\" x2=\"" + Num(x + 28) +
-           "\" y2=\"" + Num(rowY) + "\" stroke=\"" + Colour(i) + "\" stroke-width=\"2.5\"/>\n";
+    svg += "<line x1=\"" + Num(x) + "\" y1=\"" + Num(rowY) + "\" x2=\"" + Num(x + 28) + "\" y2=\"" +
+           Num(rowY) + "\" stroke=\"" + Colour(i) + "\" stroke-width=\"2.5\"/>\n";
     svg += Text(x + 36, rowY + 4.5, series[i].name, "start");
   }
   return svg;
@@ -218,7 +230,10 @@ std::string RenderCartesianSvg(const CartesianChart& chart) {
   svg += "<g clip-path=\"url(#plot)\">\n";
   for (std::size_t i = 0; i < chart.series.size(); ++i) {
     svg += Polylines(
-        chart.series[i], [&](double x, double y) { return std::pair{mapX(x), mapY(y)}; },
+        chart.series[i],
+        [&](double x, double y) {
+          return std::pair{mapX(x), mapY(y)};
+        },
         Colour(i), true, plotW);
   }
   svg += "</g>\n" + Legend(chart.series, kLeft + plotW + 24, kTop + 12) + "</svg>\n";
@@ -228,7 +243,9 @@ std::string RenderCartesianSvg(const CartesianChart& chart) {
 std::string RenderSmithSvg(const std::string& title, const std::vector<ChartSeries>& series) {
   const double radius = (kHeight - kTop - 40) / 2;
   const double cx = kLeft + radius, cy = kTop + radius + 10;
-  const auto map = [&](double re, double im) { return std::pair{cx + re * radius, cy - im * radius}; };
+  const auto map = [&](double re, double im) {
+    return std::pair{cx + re * radius, cy - im * radius};
+  };
   std::string svg = Header(kLeft + 2 * radius + kRight + 60, kHeight, title);
   svg += "<clipPath id=\"unit\"><circle cx=\"" + Num(cx) + "\" cy=\"" + Num(cy) + "\" r=\"" +
          Num(radius) + "\"/></clipPath>\n";
@@ -238,8 +255,8 @@ std::string RenderSmithSvg(const std::string& title, const std::vector<ChartSeri
   for (double r : values) {
     // Constant resistance r: centre r/(1+r) on the real axis, radius 1/(1+r).
     const auto [px, py] = map(r / (1 + r), 0);
-    svg += "<circle cx=\"" + Num(px) + "\" cy=\"" + Num(py) + "\" r=\"" +
-           Num(radius / (1 + r)) + "\" " + grid + "/>\n";
+    svg += "<circle cx=\"" + Num(px) + "\" cy=\"" + Num(py) + "\" r=\"" + Num(radius / (1 + r)) +
+           "\" " + grid + "/>\n";
   }
   for (double x : values) {
     // Constant reactance +-x: centre (1, +-1/x), radius 1/x.
@@ -273,13 +290,13 @@ std::string RenderSmithSvg(const std::string& title, const std::vector<ChartSeri
     svg += Polylines(series[i], map, Colour(i), false, 0);
     if (!series[i].x.empty() && std::isfinite(series[i].x[0]) && std::isfinite(series[i].y[0])) {
       const auto [px, py] = map(series[i].x[0], series[i].y[0]);
-      svg += "<circle cx=\"" + Num(px) + "\" cy=\"" + Num(py) + "\" r=\"3.5\" fill=\"" +
-             Colour(i) + "\"/>\n";
+      svg += "<circle cx=\"" + Num(px) + "\" cy=\"" + Num(py) + "\" r=\"3.5\" fill=\"" + Colour(i) +
+             "\"/>\n";
     }
   }
   svg += Legend(series, cx + radius + 50, kTop + 12);
-  svg += Text(cx + radius + 50, kTop + 12 + 22.0 * series.size() + 10, "dot: first point",
-              "start", " font-size=\"11\" fill=\"#707070\"");
+  svg += Text(cx + radius + 50, kTop + 12 + 22.0 * series.size() + 10, "dot: first point", "start",
+              " font-size=\"11\" fill=\"#707070\"");
   svg += "</svg>\n";
   return svg;
 }

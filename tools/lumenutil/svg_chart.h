@@ -20,7 +20,7 @@ struct CartesianChart {
   std::string xQuantity;  // "Frequency"
   std::string xUnit;      // "Hz"; ticks take SI prefixes when xSiPrefix is true
   bool xSiPrefix = true;
-  std::string yLabel;     // "Magnitude (dB)"
+  std::string yLabel;  // "Magnitude (dB)"
   // When set, the y axis spans exactly [yMin, yMax] with ticks every yStep (phase in
   // degrees); otherwise it fits the data with round ticks.
   bool fixedY = false;

@@ -14,8 +14,8 @@ constexpr double kDegreesPerRadian = 57.29577951308232;
 }  // namespace
 
 const std::vector<std::string>& TraceFormatNames() {
-  static const std::vector<std::string> names = {"ri",    "ma",     "db",  "logmag", "phase",
-                                                 "uphase", "swr", "z",      "y"};
+  static const std::vector<std::string> names = {"ri",     "ma",  "db", "logmag", "phase",
+                                                 "uphase", "swr", "z",  "y"};
   return names;
 }
 

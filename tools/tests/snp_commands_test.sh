@@ -54,7 +54,7 @@ printf '# Hz RI\n1 1 0\n2 0.5 0\n' >"$work/one.txt"
 "$tool" snp info "$work/one.txt" >/dev/null 2>&1 && fail "a one-port file was read as two-port"
 expect_line "$("$tool" snp info --ports 1 "$work/one.txt")" '^points +2$'
 
-for command in info export plot; do
+for command in info export plot resample; do
   "$tool" snp "$command" --help | grep -q "Usage" || fail "snp $command --help"
 done
 exit $((failures > 0))

@@ -34,6 +34,14 @@ class LUMEN_API CSNParameter {
   void LoadSNP(std::vector<float>& a, std::vector<float>& b,
                const LumenUtility::InputArray& stimulus, ESNPForm form);
 
+  // Moves the trace onto `stimulus` (same unit as the trace's) by circular interpolation
+  // and keeps the name. Where `stimulus` reaches outside the trace's first or last point the
+  // whole trace becomes (0, 0) (widen it first with CSnPFileBase::ExtroplateReadSNPFile).
+  // With `reset` the spare data become stimulus.size() zeros and the spare stimulus empty;
+  // without it they stay as they were. A trace without data or stimulus points, and any trace
+  // when `stimulus` is empty, is left untouched.
+  void Interpolate(const LumenUtility::InputArray& stimulus, bool reset);
+
   // One complex value from a file's pair: RI (a, b); MA a at b degrees; DB 10^(a/20) at
   // b degrees. Any other form gives (0, 0).
   static LumenUtility::TsComplex FromPair(float a, float b, ESNPForm form);

@@ -39,6 +39,8 @@ class LUMEN_API CSNParameterS {
   // Custom trace i (noise data: 0 NFmin, 1 GammaOpt, 2 Rn), growing the list to i + 1
   // entries when needed. Precondition: i >= 0.
   CSNParameter& GetCustomParam(int i);
+  // Custom trace i; std::out_of_range for i outside 0 .. GetNumCustomParams() - 1.
+  const CSNParameter& GetCustomParam(int i) const { return m_customParams.at(i); }
 
  protected:
   int LoopIndex(int k) const;

@@ -1,5 +1,6 @@
 // CSnPFileBase: reads a Touchstone file (version 1 or 2.0) into the traces of a
-// CSNParameterS, and carries them onto other stimulus points.
+// CSNParameterS, and carries them onto other stimulus points (the usual order is
+// ExtroplateReadSNPFile, then InterpolateReadSNPFile with the same stimulus).
 //
 // Reading fills one trace per matrix position, named "S11", "S21", ... ("S10_1" and the like
 // past nine ports), all on the file's stimulus points in Hz (or in the file's own unit when
@@ -18,12 +19,12 @@
 
 // Facts about the last file read successfully, beyond its traces.
 struct SnPFileInfo {
-  int version = 0;                    // 1 or 2; 0 before the first successful read
-  std::string stimulusUnit = "GHZ";   // the option line's unit token, upper case
-  double stimulusMultiplier = 1e9;    // stimulus unit of the file, in Hz (1 for SEC, DBM...)
-  char parameter = 'S';               // S, Y, Z, H or G as the option line names it
+  int version = 0;                   // 1 or 2; 0 before the first successful read
+  std::string stimulusUnit = "GHZ";  // the option line's unit token, upper case
+  double stimulusMultiplier = 1e9;   // stimulus unit of the file, in Hz (1 for SEC, DBM...)
+  char parameter = 'S';              // S, Y, Z, H or G as the option line names it
   ESNPForm form = SNP_MA;
-  double referenceResistance = 50.0;  // ohms, the option line's R
+  double referenceResistance = 50.0;   // ohms, the option line's R
   std::vector<double> portReferences;  // ohms per port from [Reference]; empty without it
   SnPMatrixFormat matrixFormat = SNP_MATRIX_FULL;
   int declaredFrequencies = 0;  // [Number of Frequencies]; 0 when absent
@@ -51,6 +52,15 @@ class LUMEN_API CSnPFileBase : public CSNParameterS {
   // after a successful read.
   const std::wstring& GetReadError() const { return m_readError; }
   const SnPFileInfo& GetFileInfo() const { return m_info; }
+
+  // Interpolate(stimulus, reset) on every matrix trace; the noise traces stay as read.
+  void InterpolateReadSNPFile(const LumenUtility::InputArray& stimulus, bool reset);
+  // Widens every matrix trace that does not cover the range of `stimulus`: a point at the
+  // target's lowest value is put before the trace's first point, holding that point's value,
+  // and one at the target's highest value after its last point likewise. Traces are taken to
+  // ascend; traces without points, and an empty target, are left untouched, as are the noise
+  // traces.
+  void ExtroplateReadSNPFile(const LumenUtility::InputArray& stimulus);
 
   SweepTypeEnum GetSweepType() const { return m_sweepType; }
   void SetSweepType(SweepTypeEnum type) { m_sweepType = type; }

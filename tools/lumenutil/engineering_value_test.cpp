@@ -1,0 +1,28 @@
+#include "lumenutil/engineering_value.h"
+
+#include <gtest/gtest.h>
+
+namespace lumenutil {
+namespace {
+
+TEST(EngineeringValue, NumbersTakeAPrefixAndTheUnit) {
+  EXPECT_EQ(ParseEngineeringValue("2.4e9", "Hz"), 2.4e9);
+  EXPECT_EQ(ParseEngineeringValue("2.4G", "Hz"), 2.4e9);
+  EXPECT_EQ(ParseEngineeringValue("2.4 GHz", "Hz"), 2.4e9);
+  EXPECT_EQ(ParseEngineeringValue("800mhz", "Hz"), 0.8);  // m is milli, as written
+  EXPECT_EQ(ParseEngineeringValue("800MHZ", "Hz"), 800e6);
+  EXPECT_EQ(ParseEngineeringValue("5 \xC2\xB5s", "s"), 5e-6);
+  EXPECT_EQ(ParseEngineeringValue("+10", "dBm"), 10.0);
+  EXPECT_EQ(ParseEngineeringValue("-10 dBm", "dBm"), -10.0);
+  EXPECT_EQ(ParseEngineeringValue("7 Hz", "Hz"), 7.0);
+}
+
+TEST(EngineeringValue, AnythingElseIsRefused) {
+  for (const char* bad : {"", "G", "2.4X", "2.4 GHzz", "2.4GG", "inf", "nan", "1e400", "1e300T",
+                          "--1", "2.4 Hz", "0x10"}) {
+    EXPECT_FALSE(ParseEngineeringValue(bad, "s").has_value()) << bad;
+  }
+}
+
+}  // namespace
+}  // namespace lumenutil

@@ -1,0 +1,107 @@
+#include <fstream>
+#include <iostream>
+#include <memory>
+#include <stdexcept>
+#include <string>
+
+#include "lumen/platform.h"
+#include "lumen/stimulus.h"
+#include "lumenutil/engineering_value.h"
+#include "lumenutil/snp_commands.h"
+#include "lumenutil/snp_file.h"
+#include "lumenutil/touchstone_writer.h"
+
+using LumenUtility::InputArray;
+
+namespace lumenutil {
+namespace {
+
+struct ResampleOptions {
+  std::string path;
+  std::string start;
+  std::string stop;
+  int points = 0;
+  bool log = false;
+  bool holdEnds = false;
+  std::string output;
+  int ports = 0;
+};
+
+double ReadStimulus(const std::string& text, const StimulusAxis& axis, const char* option) {
+  const std::optional<double> value = ParseEngineeringValue(text, axis.unit);
+  if (!value) {
+    throw std::runtime_error(std::string(option) + " '" + text + "' is not a value" +
+                             (axis.unit.empty() ? "" : " in " + axis.unit) +
+                             " (examples: 1.5e9, 1.5G, 1.5 GHz)");
+  }
+  return *value;
+}
+
+void Resample(const ResampleOptions& options) {
+  CSnPFileBase file = ReadTouchstone(options.path, options.ports);
+  const StimulusAxis axis = AxisOf(file.GetResultType());
+  const double start = ReadStimulus(options.start, axis, "--start");
+  const double stop = ReadStimulus(options.stop, axis, "--stop");
+  if (options.log && (start <= 0 || stop <= 0)) {
+    throw std::runtime_error("a logarithmic sweep needs --start and --stop above 0");
+  }
+  const int outputPorts = SnPPortCountFromFileName(LumenUtility::Utf8ToWide(options.output));
+  if (outputPorts > 0 && outputPorts != file.GetSNPType()) {
+    throw std::runtime_error(options.output + " names " + std::to_string(outputPorts) +
+                             " ports, but the network has " + std::to_string(file.GetSNPType()));
+  }
+  const CSNParameter& s11 = file.GetParam(SNP_S11);
+  if (s11.GetNumPoints() == 0) throw std::runtime_error(options.path + ": no data points");
+  const InputArray target(start, stop, options.points,
+                          options.log ? LumenUtility::Log : LumenUtility::Linear);
+  const double low = std::min(start, stop), high = std::max(start, stop);
+  if (!options.holdEnds && (low < s11.GetStartFreq() || high > s11.GetStopFreq())) {
+    throw std::runtime_error("the new sweep " + WithUnit(low, axis.unit, axis.siPrefix) + " to " +
+                             WithUnit(high, axis.unit, axis.siPrefix) +
+                             " reaches outside the file's " +
+                             WithUnit(s11.GetStartFreq(), axis.unit, axis.siPrefix) + " to " +
+                             WithUnit(s11.GetStopFreq(), axis.unit, axis.siPrefix) +
+                             "; --hold-ends extends each trace with its end values");
+  }
+  if (options.holdEnds) file.ExtroplateReadSNPFile(target);
+  file.InterpolateReadSNPFile(target, true);
+
+  std::ofstream out(options.output, std::ios::binary);
+  if (!out) throw std::runtime_error(options.output + ": cannot be written");
+  const std::string comment =
+      "Resampled by lumenutil from " + options.path + " onto " + std::to_string(options.points) +
+      (options.log ? " logarithmic" : " linear") + " points, " +
+      WithUnit(start, axis.unit, axis.siPrefix) + " to " +
+      WithUnit(stop, axis.unit, axis.siPrefix) + (options.holdEnds ? ", end values held" : "");
+  WriteTouchstoneV1(file, comment, out, std::cerr);
+  if (!out.flush()) throw std::runtime_error(options.output + ": writing failed");
+}
+
+}  // namespace
+
+void AddSnpResampleCommand(CLI::App& snp) {
+  CLI::App* command =
+      snp.add_subcommand("resample",
+                         "Carry every trace of a Touchstone file onto a new linear or logarithmic "
+                         "sweep by circular interpolation and write a Touchstone version 1 file");
+  auto options = std::make_shared<ResampleOptions>();
+  command->add_option("FILE", options->path, "Touchstone file")->required();
+  command->add_option("--start", options->start, "first stimulus value, e.g. 1.5e9, 1.5G or 1.5GHz")
+      ->required();
+  command->add_option("--stop", options->stop, "last stimulus value")->required();
+  command->add_option("--points", options->points, "number of points")
+      ->required()
+      ->check(CLI::Range(1, 100000000));
+  command->add_flag("--log", options->log, "logarithmic instead of linear spacing");
+  command->add_flag("--hold-ends", options->holdEnds,
+                    "where the sweep reaches beyond the file, hold each trace's end values");
+  command->add_option("--output,-o", options->output, "Touchstone file to write (OUT.sNp)")
+      ->required();
+  command
+      ->add_option("--ports", options->ports,
+                   "port count of a version 1 file whose name does not end in .sNp")
+      ->check(CLI::Range(1, CSnPFileBase::kMaxPorts));
+  command->callback([options] { Resample(*options); });
+}
+
+}  // namespace lumenutil
