@@ -1,8 +1,8 @@
 #!/usr/bin/env bash
 # The main job: builds the library, its example program and the lumenutil tool, runs the
 # example, then shows lumenutil at work on the bundled Touchstone file (a band-pass filter
-# written by tools/make_bandpass_s2p.py): its description, the first rows of an export, and
-# SVG plots in build/example/.
+# written by tools/make_bandpass_s2p.py): its description, the first rows of an export, the
+# passband resampled onto five points, and SVG plots in build/example/.
 set -euo pipefail
 root=$(cd "$(dirname "$0")/.." && pwd)
 cd "$root"
@@ -21,6 +21,8 @@ run() {
 }
 run snp info "$example"
 run snp export "$example" --params S21,S11 --format db --limit 5
+run snp resample "$example" --start 2.3G --stop 2.5G --points 5 -o build/example/passband.s2p
+run snp export build/example/passband.s2p --params S21,S11 --format db
 run snp plot "$example" --params S21,S11,S22 -o build/example/bandpass_filter.svg
 run snp plot "$example" --format smith -o build/example/bandpass_filter_smith.svg
 echo
