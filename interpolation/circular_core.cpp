@@ -7,6 +7,7 @@
 #include <optional>
 
 #include "interpolation/arc_math.h"
+#include "interpolation/gallop_search.h"
 #include "interpolation/phase_fit.h"
 #include "lumen/interpolation/linear_interpolation.h"
 
@@ -80,37 +81,6 @@ class IntervalInterpolator {
   std::optional<MagPhaseLine> m_line;
 };
 
-// Index i of the old interval [X[i-1], X[i]] for x, bisecting from lo; sets found when some
-// X[i] equals x. Values below the range give 1, above it n - 1. Precondition: n >= 2,
-// 0 <= lo <= n - 1. Always returns an index in [0, n - 1] (1 or more unless found), also for
-// NaN or stimuli out of order.
-int Locate(const double* x, int n, double value, int lo, bool& found) {
-  found = false;
-  if (value < x[0]) return 1;
-  if (value > x[n - 1]) return n - 1;
-  // The hint holds for an ascending sweep of new values; anything else starts from 0.
-  if (!(x[lo] <= value)) lo = 0;
-  int hi = n - 1;
-  while (lo < hi) {
-    const int mid = lo + (hi - lo) / 2;
-    if (x[mid] == value) {
-      found = true;
-      return mid;
-    }
-    if (x[mid] > value) {
-      hi = mid;
-      continue;
-    }
-    if (x[mid + 1] == value) {
-      found = true;
-      return mid + 1;
-    }
-    if (x[mid + 1] > value) return mid + 1;
-    lo = mid + 1;
-  }
-  return std::max(lo, 1);
-}
-
 // Writes every new point; returns how many took an old value.
 int FirstPass(int n, const double* x, const TsComplex* d, const CoreRequest& request) {
   const tagSlope newOrder = Direction(request.newCount, request.newStimulus);
@@ -127,7 +97,7 @@ int FirstPass(int n, const double* x, const TsComplex* d, const CoreRequest& req
     }
     const int lo = newOrder == SLOPE_ASCENDING ? std::max(previous - 1, 0) : 0;
     bool found = false;
-    int i = Locate(x, n, value, lo, found);
+    int i = LocateInterval(x, n, value, lo, found);
     if (std::fabs(value - x[i]) < kMatchTolerance) found = true;
     // The lower neighbour wins, also over an exact match above it.
     if (i > 0 && std::fabs(value - x[i - 1]) < kMatchTolerance) {
@@ -170,6 +140,44 @@ AscendingTrace::AscendingTrace(int n, const double* stimulus, const TsComplex* d
   }
   m_x = m_xCopy.data();
   m_d = m_dCopy.data();
+}
+
+int LocateInterval(const double* x, int n, double value, int lo, bool& found) {
+  found = false;
+  if (value < x[0]) return 1;
+  if (value > x[n - 1]) return n - 1;
+  // The hint holds for an ascending sweep of new values; anything else starts from 0.
+  if (!(x[lo] <= value)) lo = 0;
+  // Unless the value equals two neighbouring old points, every bisection ends at the first
+  // point not below the value. Galloping from lo finds it in a few probes for a sweep instead
+  // of log n; for a run of equal points the bisection below picks which one is reported, as
+  // its probe order decides.
+  const int first = lo + static_cast<int>(GallopBoundary(
+                             n - lo, 0, [&](std::ptrdiff_t k) { return x[lo + k] >= value; }));
+  if (first < n && x[first] > value) return first;
+  if (first < n && x[first] == value && !(first + 1 < n && x[first + 1] == value)) {
+    found = true;
+    return first;
+  }
+  int hi = n - 1;
+  while (lo < hi) {
+    const int mid = lo + (hi - lo) / 2;
+    if (x[mid] == value) {
+      found = true;
+      return mid;
+    }
+    if (x[mid] > value) {
+      hi = mid;
+      continue;
+    }
+    if (x[mid + 1] == value) {
+      found = true;
+      return mid + 1;
+    }
+    if (x[mid + 1] > value) return mid + 1;
+    lo = mid + 1;
+  }
+  return std::max(lo, 1);
 }
 
 bool Overlap(const TsComplex* a, int aCount, const TsComplex* b, int bCount) {

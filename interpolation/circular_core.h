@@ -51,6 +51,13 @@ struct CoreRequest {
   const LeadPoint* lead = nullptr;
 };
 
+// Index i of the old interval [x[i-1], x[i]] holding `value`, as a bisection of the ascending
+// x[lo .. n - 1] finds it: 1 below the range, n - 1 above it; `found` set, with i the point
+// probed first, when some x[i] equals the value. Precondition: n >= 2, 0 <= lo <= n - 1 (a lo
+// with x[lo] above the value is taken as 0). Returns an index in [0, n - 1] (1 or more unless
+// found) whatever the data, NaN and disorder included.
+int LocateInterval(const double* x, int n, double value, int lo, bool& found);
+
 // Whether the arrays a[0 .. aCount - 1] and b[0 .. bCount - 1] share memory.
 bool Overlap(const TsComplex* a, int aCount, const TsComplex* b, int bCount);
 
