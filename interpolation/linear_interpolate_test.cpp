@@ -103,6 +103,8 @@ TEST(FindNearestIndex, CrossesSegmentsAndTheGapsBetweenThem) {
   EXPECT_EQ(FindNearestIndex(stimulus, 0.0, 30.0), 13.0);
   EXPECT_EQ(FindNearestIndex(stimulus, 0.0, kNaN), 0.0);
   EXPECT_EQ(FindNearestIndex(InputArray(), 5.0, 1.0), 0.0);
+  // A repeated value inside explicit points: the segment reports its last crossing.
+  EXPECT_EQ(FindNearestIndex(InputArray(std::vector<double>{1, 2, 2, 3}), 0.0, 2.0), 2.0);
 }
 
 TEST(FindNearestIndex, NearerEndWinsOutsideWithTheLastOnATie) {

@@ -59,13 +59,15 @@ LUMEN_API tagSlope Direction(std::int32_t count, const double* values);
 
 // Carries a trace from `oldStimulus` onto `newStimulus`. Each new point takes the linear
 // interpolation of `in` at FindNearestIndex(oldStimulus, 0.0, new value): points outside the
-// old range take the nearer end value, and where the old stimulus reaches a value more than
-// once the crossing nearest index 0 is used.
+// old range take the nearer end value; where the old stimulus repeats a value, the first
+// segment or gap reaching it answers, an explicit-point segment with its Segment::Find choice
+// (for 1, 2, 2, 3 and the value 2: index 2).
 // Returns INTERP_UNCHANGED with out = in when both stimuli are equal; INTERP_NOT_MONOTONIC with
 // `out` untouched when the old stimulus neither ascends nor descends, or holds a NaN or an
 // infinity; else INTERP_DONE with out.size() == newStimulus.size().
 // Throws LumenException(LUMEN_E_BOUNDS) without touching `out` when `in` holds fewer than
-// oldStimulus.size() values. Costs O(log N) per new point. `in` and `out` may be one vector.
+// oldStimulus.size() values. Costs at most O(log N) per new point, about constant for new
+// points in order. `in` and `out` may be one vector.
 LUMEN_API tagInterpStatus LinearInterpolation(const InputArray& oldStimulus,
                                               const InputArray& newStimulus,
                                               const std::vector<float>& in,
