@@ -10,30 +10,18 @@
 // random steps (magnitude/phase everywhere).
 #include <benchmark/benchmark.h>
 
-#include <time.h>
-
-#include <chrono>
 #include <cmath>
 #include <random>
 #include <vector>
 
 #include "alloc_counter.h"
+#include "bench_timing.h"
 #include "lumen/interpolation/circular_interpolation.h"
 
 namespace {
 
 using LumenUtility::InputArray;
 using LumenUtility::TsComplex;
-// The thread's CPU time: on a shared machine, time spent preempted would otherwise land on
-// whichever of the two compared loops happened to be running.
-struct Clock {
-  using time_point = std::chrono::duration<double>;
-  static time_point now() {
-    timespec t;
-    clock_gettime(CLOCK_THREAD_CPUTIME_ID, &t);
-    return time_point(t.tv_sec + 1e-9 * t.tv_nsec);
-  }
-};
 
 struct Case {
   InputArray oldStimulus;
@@ -71,10 +59,6 @@ void Baseline(const std::vector<TsComplex>& in, std::vector<TsComplex>& out) {
   }
 }
 
-double Seconds(Clock::time_point a, Clock::time_point b) {
-  return (b - a).count();
-}
-
 void Run(benchmark::State& state, bool ragged) {
   const int n = static_cast<int>(state.range(0));
   const Case c = MakeCase(n, ragged);
@@ -82,28 +66,21 @@ void Run(benchmark::State& state, bool ragged) {
   // Keep the stimulus arrays' flattened points out of the timed calls.
   c.oldStimulus.GetRawArray();
   c.newStimulus.GetRawArray();
-  double seconds = 0.0, baselineSeconds = 0.0;
   lumen_bench::AllocationTotals allocations;
-  for (auto _ : state) {
-    const auto t0 = Clock::now();
-    const lumen_bench::AllocationScope scope;
-    bool interpolated = false;
-    LumenUtility::CircularInterpolation(c.oldStimulus, c.data.data(), c.newStimulus, out.data(),
-                                        &interpolated, LumenUtility::INTERP_CIRCULAR);
-    allocations = scope.Totals();
-    benchmark::ClobberMemory();
-    const auto t1 = Clock::now();
-    Baseline(c.data, baselineOut);
-    benchmark::ClobberMemory();
-    const auto t2 = Clock::now();
-    seconds += Seconds(t0, t1);
-    baselineSeconds += Seconds(t1, t2);
-    state.SetIterationTime(Seconds(t0, t1));
-  }
+  const lumen_bench::SecondsInTurn seconds = lumen_bench::TimeInTurn(
+      state, lumen_bench::Reported::kFirst, [] {},
+      [&] {
+        const lumen_bench::AllocationScope scope;
+        bool interpolated = false;
+        LumenUtility::CircularInterpolation(c.oldStimulus, c.data.data(), c.newStimulus, out.data(),
+                                            &interpolated, LumenUtility::INTERP_CIRCULAR);
+        allocations = scope.Totals();
+      },
+      [&] { Baseline(c.data, baselineOut); });
   const double points = static_cast<double>(n) * state.iterations();
-  state.counters["ns_per_point"] = 1e9 * seconds / points;
-  state.counters["baseline_ns_per_point"] = 1e9 * baselineSeconds / points;
-  state.counters["x_baseline"] = seconds / baselineSeconds;
+  state.counters["ns_per_point"] = 1e9 * seconds.first / points;
+  state.counters["baseline_ns_per_point"] = 1e9 * seconds.second / points;
+  state.counters["x_baseline"] = seconds.first / seconds.second;
   state.counters["allocs_per_call"] = static_cast<double>(allocations.count);
 }
 

@@ -8,29 +8,17 @@
 // keeps this near 1; a linear scan would make it N / 1001).
 #include <benchmark/benchmark.h>
 
-#include <time.h>
-
-#include <chrono>
 #include <cmath>
 #include <random>
 #include <vector>
 
+#include "bench_timing.h"
 #include "lumen/interpolation/linear_interpolation.h"
 
 namespace {
 
 using LumenUtility::InputArray;
 using LumenUtility::TsComplex;
-// The thread's CPU time: on a shared machine, time spent preempted would otherwise land on
-// whichever of the two compared loops happened to be running.
-struct Clock {
-  using time_point = std::chrono::duration<double>;
-  static time_point now() {
-    timespec t;
-    clock_gettime(CLOCK_THREAD_CPUTIME_ID, &t);
-    return time_point(t.tv_sec + 1e-9 * t.tv_nsec);
-  }
-};
 
 struct Case {
   InputArray oldStimulus;
@@ -56,34 +44,24 @@ Case MakeCase(int n) {
   return c;
 }
 
-double Seconds(Clock::time_point a, Clock::time_point b) {
-  return (b - a).count();
-}
-
 void BM_LinearInterpolationArbitrary(benchmark::State& state) {
   const int n = static_cast<int>(state.range(0));
   constexpr int kSmall = 1001;
   Case big = MakeCase(n);
   Case small = MakeCase(kSmall);
   const int repeats = (n + kSmall - 1) / kSmall;
-  double bigSeconds = 0.0, smallSeconds = 0.0;
-  for (auto _ : state) {
-    const auto t0 = Clock::now();
-    LinearInterpolation(big.oldStimulus, big.newStimulus, big.data, big.out);
-    benchmark::ClobberMemory();
-    const auto t1 = Clock::now();
-    for (int r = 0; r < repeats; ++r) {
-      LinearInterpolation(small.oldStimulus, small.newStimulus, small.data, small.out);
-      benchmark::ClobberMemory();
-    }
-    const auto t2 = Clock::now();
-    bigSeconds += Seconds(t0, t1);
-    smallSeconds += Seconds(t1, t2);
-    state.SetIterationTime(Seconds(t0, t1));
-  }
-  const double bigNs = 1e9 * bigSeconds / (static_cast<double>(n) * state.iterations());
+  const lumen_bench::SecondsInTurn seconds = lumen_bench::TimeInTurn(
+      state, lumen_bench::Reported::kFirst, [] {},
+      [&] { LinearInterpolation(big.oldStimulus, big.newStimulus, big.data, big.out); },
+      [&] {
+        for (int r = 0; r < repeats; ++r) {
+          LinearInterpolation(small.oldStimulus, small.newStimulus, small.data, small.out);
+          benchmark::ClobberMemory();
+        }
+      });
+  const double bigNs = 1e9 * seconds.first / (static_cast<double>(n) * state.iterations());
   const double smallNs =
-      1e9 * smallSeconds / (static_cast<double>(kSmall) * repeats * state.iterations());
+      1e9 * seconds.second / (static_cast<double>(kSmall) * repeats * state.iterations());
   state.counters["ns_per_point"] = bigNs;
   state.counters["ns_per_point_1001"] = smallNs;
   state.counters["x_1001"] = bigNs / smallNs;

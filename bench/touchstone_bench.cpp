@@ -9,14 +9,16 @@
 #include <charconv>
 #include <cmath>
 #include <cstdio>
-#include <ctime>
 #include <fstream>
 #include <iterator>
 #include <string>
 
+#include "bench_timing.h"
 #include "lumen/data.h"
 
 namespace {
+
+using lumen_bench::ThreadSeconds;
 
 struct GeneratedFile {
   std::string path;
@@ -101,14 +103,6 @@ double FromCharsPass(const std::string& text) {
     p = r.ptr;
   }
   return sum;
-}
-
-// CPU time of this thread: the machine may be shared, and the ratio of two wall-clock
-// measurements taken at different moments would mostly measure the neighbours.
-double ThreadSeconds() {
-  timespec now;
-  clock_gettime(CLOCK_THREAD_CPUTIME_ID, &now);
-  return now.tv_sec + now.tv_nsec * 1e-9;
 }
 
 // MB/s of the from_chars pass, measured once per file and process.

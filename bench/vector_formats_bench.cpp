@@ -12,6 +12,7 @@
 #include <random>
 #include <vector>
 
+#include "bench_timing.h"
 #include "lumen/core/vector_formats.h"
 
 namespace {
@@ -31,60 +32,29 @@ std::vector<TsComplex> MakeTrace(int n) {
   return v;
 }
 
-double Seconds(Clock::time_point a, Clock::time_point b) {
-  return std::chrono::duration<double>(b - a).count();
-}
-
-void Report(benchmark::State& state, double formatSeconds, double copySeconds) {
-  const double values = static_cast<double>(state.range(0)) * state.iterations();
-  const double formatRate = values / formatSeconds;
-  const double copyRate = values / copySeconds;
-  state.counters["values_per_s"] = formatRate;
-  state.counters["memcpy_values_per_s"] = copyRate;
-  state.counters["x_memcpy"] = copyRate / formatRate;
-}
-
 void BM_FormatUnwrappedPhase(benchmark::State& state) {
   const int n = static_cast<int>(state.range(0));
   const std::vector<TsComplex> trace = MakeTrace(n);
   std::vector<TsComplex> copy(n);
   std::vector<float> phase(n);
-  double formatSeconds = 0.0, copySeconds = 0.0;
-  for (auto _ : state) {
-    const auto t0 = Clock::now();
-    std::memcpy(copy.data(), trace.data(), n * sizeof(TsComplex));
-    benchmark::ClobberMemory();
-    const auto t1 = Clock::now();
-    LumenUtility::FormatUnwrappedPhase(trace.data(), phase.data(), 0, n);
-    benchmark::ClobberMemory();
-    const auto t2 = Clock::now();
-    copySeconds += Seconds(t0, t1);
-    formatSeconds += Seconds(t1, t2);
-    state.SetIterationTime(Seconds(t1, t2));
-  }
+  const lumen_bench::SecondsInTurn seconds = lumen_bench::TimeInTurn<Clock>(
+      state, lumen_bench::Reported::kSecond, [] {},
+      [&] { std::memcpy(copy.data(), trace.data(), n * sizeof(TsComplex)); },
+      [&] { LumenUtility::FormatUnwrappedPhase(trace.data(), phase.data(), 0, n); });
   benchmark::DoNotOptimize(copy.data());
-  Report(state, formatSeconds, copySeconds);
+  lumen_bench::ReportAgainstMemcpy(state, seconds.second, seconds.first);
 }
 
 void BM_ToLogMag(benchmark::State& state) {
   const int n = static_cast<int>(state.range(0));
   const std::vector<TsComplex> trace = MakeTrace(n);
   std::vector<TsComplex> work(n);
-  double formatSeconds = 0.0, copySeconds = 0.0;
-  for (auto _ : state) {
-    // The copy both restores the input that ToLogMag overwrites and is the baseline.
-    const auto t0 = Clock::now();
-    std::memcpy(work.data(), trace.data(), n * sizeof(TsComplex));
-    benchmark::ClobberMemory();
-    const auto t1 = Clock::now();
-    LumenUtility::ToLogMag(work);
-    benchmark::ClobberMemory();
-    const auto t2 = Clock::now();
-    copySeconds += Seconds(t0, t1);
-    formatSeconds += Seconds(t1, t2);
-    state.SetIterationTime(Seconds(t1, t2));
-  }
-  Report(state, formatSeconds, copySeconds);
+  // The copy both restores the input that ToLogMag overwrites and is the baseline.
+  const lumen_bench::SecondsInTurn seconds = lumen_bench::TimeInTurn<Clock>(
+      state, lumen_bench::Reported::kSecond, [] {},
+      [&] { std::memcpy(work.data(), trace.data(), n * sizeof(TsComplex)); },
+      [&] { LumenUtility::ToLogMag(work); });
+  lumen_bench::ReportAgainstMemcpy(state, seconds.second, seconds.first);
 }
 
 BENCHMARK(BM_FormatUnwrappedPhase)->Arg(20001)->Arg(100001)->UseManualTime();

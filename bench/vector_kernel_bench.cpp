@@ -13,6 +13,7 @@
 #include <cstring>
 #include <vector>
 
+#include "bench_timing.h"
 #include "lumen/interpolation/tarn_interpolation.h"
 
 namespace {
@@ -46,33 +47,12 @@ std::vector<TsComplex> Trace(int n) {
   return v;
 }
 
-double Seconds(Clock::time_point a, Clock::time_point b) {
-  return std::chrono::duration<double>(b - a).count();
-}
-
 // Times `copy` then `kernel` each iteration; `restore` runs untimed first.
 template <typename Restore, typename Copy, typename Kernel>
 void Measure(benchmark::State& state, Restore restore, Copy copy, Kernel kernel) {
-  double kernelSeconds = 0.0, copySeconds = 0.0;
-  for (auto _ : state) {
-    restore();
-    benchmark::ClobberMemory();
-    const auto t0 = Clock::now();
-    copy();
-    benchmark::ClobberMemory();
-    const auto t1 = Clock::now();
-    kernel();
-    benchmark::ClobberMemory();
-    const auto t2 = Clock::now();
-    copySeconds += Seconds(t0, t1);
-    kernelSeconds += Seconds(t1, t2);
-    state.SetIterationTime(Seconds(t1, t2));
-  }
-  const double values = static_cast<double>(state.range(0)) * state.iterations();
-  const double kernelRate = values / kernelSeconds, copyRate = values / copySeconds;
-  state.counters["values_per_s"] = kernelRate;
-  state.counters["memcpy_values_per_s"] = copyRate;
-  state.counters["x_memcpy"] = copyRate / kernelRate;
+  const lumen_bench::SecondsInTurn seconds =
+      lumen_bench::TimeInTurn<Clock>(state, lumen_bench::Reported::kSecond, restore, copy, kernel);
+  lumen_bench::ReportAgainstMemcpy(state, seconds.second, seconds.first);
 }
 
 void BM_LinearComplex(benchmark::State& state) {

@@ -35,6 +35,56 @@ double WholeIntervalCrossing(const float* data, int i, float t) {
   return static_cast<double>(static_cast<float>(i) + offset);
 }
 
+// The walk over consecutive intervals in the search direction. Each step looks at one
+// interval: a strict crossing ends the search there; a flat run on the target is remembered
+// by its end farther along the walk, so that a later crossing still wins and, failing one,
+// the walk ends at the last flat run it passed.
+class Walk {
+ public:
+  Walk(const float* data, float target, bool searchRight)
+      : m_data(data), m_target(target), m_searchRight(searchRight) {}
+
+  // Looks at the interval between fractional indices p <= q, its end values interpolated in
+  // double precision. Returns true with `position` set when the target is crossed in it.
+  bool Partial(double p, double q, double& position) {
+    const double a = ValueAt(m_data, p);
+    const double b = ValueAt(m_data, q);
+    if (!Crosses(Classify(a, b, m_target), p, q)) return false;
+    position = Interpolate(p, a, q, b, m_target);
+    return true;
+  }
+
+  // Looks at the whole interval (i, i + 1); a crossing in it is computed in single precision.
+  bool Whole(int i, double& position) {
+    if (!Crosses(Classify(m_data[i], m_data[i + 1], m_target), i, i + 1)) return false;
+    position = WholeIntervalCrossing(m_data, i, m_target);
+    return true;
+  }
+
+  // At the end of the walk: the remembered flat run's far end, if any.
+  bool Finish(double& position) const {
+    if (!m_haveFlat) return false;
+    position = m_flatEnd;
+    return true;
+  }
+
+ private:
+  // Whether the interval [p, q] crosses the target strictly; remembers it when it is flat.
+  bool Crosses(Crossing c, double p, double q) {
+    if (c == Crossing::kFlat) {
+      m_haveFlat = true;
+      m_flatEnd = m_searchRight ? q : p;
+    }
+    return c == Crossing::kStrict;
+  }
+
+  const float* m_data;
+  float m_target;
+  bool m_searchRight;
+  bool m_haveFlat = false;
+  double m_flatEnd = 0.0;
+};
+
 }  // namespace
 
 bool ValueSearch(double start, const float* data, int count, double rangeLow, double rangeHigh,
@@ -57,106 +107,31 @@ bool ValueSearch(double start, const float* data, int count, double rangeLow, do
     high = std::min(rangeHigh, start);
   }
   if (high < low) return false;  // also catches a range lying wholly outside the data
-  const double t = target;
 
+  Walk walk(data, target, searchRight);
   if (std::floor(low) == std::floor(high)) {
-    const double a = ValueAt(data, low);
-    const double b = ValueAt(data, high);
-    switch (Classify(a, b, t)) {
-      case Crossing::kStrict:
-        position = Interpolate(low, a, high, b, t);
-        return true;
-      case Crossing::kFlat:
-        position = searchRight ? high : low;
-        return true;
-      case Crossing::kNone:
-        return false;
-    }
+    return walk.Partial(low, high, position) || walk.Finish(position);
   }
 
   // low and high lie in different intervals, so there is at least one whole point between.
+  // The partial interval at the far end is looked at even when it is a single point: a point
+  // on the target there still ends the walk when the interval before it holds a NaN.
   const int firstWhole = static_cast<int>(std::ceil(low));
   const int lastWhole = static_cast<int>(std::floor(high));
-  bool haveFallback = false;
-  double fallback = 0.0;
-
   if (searchRight) {
-    if (low != firstWhole) {
-      const double a = ValueAt(data, low);
-      const double b = data[firstWhole];
-      const Crossing c = Classify(a, b, t);
-      if (c == Crossing::kStrict) {
-        position = Interpolate(low, a, firstWhole, b, t);
-        return true;
-      }
-      if (c == Crossing::kFlat) {
-        haveFallback = true;
-        fallback = firstWhole;
-      }
-    }
+    if (low != firstWhole && walk.Partial(low, firstWhole, position)) return true;
     for (int i = firstWhole; i < lastWhole; ++i) {
-      const Crossing c = Classify(data[i], data[i + 1], t);
-      if (c == Crossing::kStrict) {
-        position = WholeIntervalCrossing(data, i, target);
-        return true;
-      }
-      if (c == Crossing::kFlat) {
-        haveFallback = true;
-        fallback = i + 1;
-      }
+      if (walk.Whole(i, position)) return true;
     }
-    const double a = data[lastWhole];
-    const double b = ValueAt(data, high);
-    const Crossing c = Classify(a, b, t);
-    if (c == Crossing::kStrict) {
-      position = Interpolate(lastWhole, a, high, b, t);
-      return true;
-    }
-    if (c == Crossing::kFlat) {
-      position = high;
-      return true;
-    }
+    if (walk.Partial(lastWhole, high, position)) return true;
   } else {
-    if (high != lastWhole) {
-      const double a = data[lastWhole];
-      const double b = ValueAt(data, high);
-      const Crossing c = Classify(a, b, t);
-      if (c == Crossing::kStrict) {
-        position = Interpolate(lastWhole, a, high, b, t);
-        return true;
-      }
-      if (c == Crossing::kFlat) {
-        haveFallback = true;
-        fallback = lastWhole;
-      }
+    if (high != lastWhole && walk.Partial(lastWhole, high, position)) return true;
+    for (int i = lastWhole - 1; i >= firstWhole; --i) {
+      if (walk.Whole(i, position)) return true;
     }
-    for (int i = lastWhole; i > firstWhole; --i) {
-      const Crossing c = Classify(data[i - 1], data[i], t);
-      if (c == Crossing::kStrict) {
-        position = WholeIntervalCrossing(data, i - 1, target);
-        return true;
-      }
-      if (c == Crossing::kFlat) {
-        haveFallback = true;
-        fallback = i - 1;
-      }
-    }
-    const double a = ValueAt(data, low);
-    const double b = data[firstWhole];
-    const Crossing c = Classify(a, b, t);
-    if (c == Crossing::kStrict) {
-      position = Interpolate(low, a, firstWhole, b, t);
-      return true;
-    }
-    if (c == Crossing::kFlat) {
-      position = low;
-      return true;
-    }
+    if (walk.Partial(low, firstWhole, position)) return true;
   }
-
-  if (!haveFallback) return false;
-  position = fallback;
-  return true;
+  return walk.Finish(position);
 }
 
 }  // namespace LumenUtility

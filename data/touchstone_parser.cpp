@@ -183,15 +183,11 @@ bool TouchstoneParser::ReadKeywordValue(const std::string& name) {
 bool TouchstoneParser::ReadRecordValues(int count, int recordLine, const char* what,
                                         std::vector<float>& out) {
   for (int read = 0; read < count;) {
-    const std::string_view token = m_scanner.NextToken();
+    const std::string_view token = m_scanner.NextValueToken();
     if (token.empty()) {
       return Fail(std::string("the file ends inside the ") + what + " that starts at line " +
                   std::to_string(recordLine) + ": " + std::to_string(count) + " values expected, " +
                   std::to_string(read) + " found");
-    }
-    if (token.front() == '!') {
-      m_scanner.CommentText(token);
-      continue;
     }
     float value = 0.0f;
     if (!ParseStreamFloat(token, value)) {
@@ -211,19 +207,9 @@ bool TouchstoneParser::ReadNetworkData() {
   c.pairsPerPoint = static_cast<int>(triangle ? n * (n + 1) / 2 : n * n);
   const int valuesPerPoint = 2 * c.pairsPerPoint;
   for (;;) {
-    const std::string_view token = m_scanner.NextToken();
+    const std::string_view token = m_scanner.NextValueToken(kNoiseMarker, &m_noiseMarked);
     if (token.empty()) return true;
-    if (token.front() == '!') {
-      const std::string_view comment = m_scanner.CommentText(token);
-      if (comment.find(kNoiseMarker) != std::string_view::npos) m_noiseMarked = true;
-      continue;
-    }
-    if (token.front() == '[') {
-      bool stop = false;
-      if (!ReadDataKeyword(token, stop)) return false;
-      if (stop) return true;
-      continue;
-    }
+    if (token.front() == '[') return ReadDataKeyword(token);
     double stimulus = 0.0;
     if (!ParseStreamDouble(token, stimulus)) {
       return Fail(Quote(token) + " is not a number (a stimulus value was expected)");
@@ -245,25 +231,15 @@ bool TouchstoneParser::ReadNetworkData() {
 
 bool TouchstoneParser::ReadAfterDeclaredPoints() {
   // Points past the declared count are not read; a [Noise Data] section still is.
-  for (;;) {
-    const std::string_view token = m_scanner.NextToken();
-    if (token.empty()) return true;
-    if (token.front() == '!') {
-      m_scanner.CommentText(token);
-      continue;
-    }
-    if (token.front() != '[') return true;
-    bool stop = false;
-    if (!ReadDataKeyword(token, stop)) return false;
-    if (stop) return true;
-  }
+  const std::string_view token = m_scanner.NextValueToken();
+  if (token.empty() || token.front() != '[') return true;
+  return ReadDataKeyword(token);
 }
 
-bool TouchstoneParser::ReadDataKeyword(std::string_view token, bool& stop) {
+bool TouchstoneParser::ReadDataKeyword(std::string_view token) {
   m_scanner.Rewind(token);
   std::string name;
   if (!m_scanner.ReadKeyword(name)) return Fail("keyword without a closing ']'");
-  stop = true;
   if (name == "END") return true;
   if (name == "NOISE DATA") {
     m_scanner.SkipLine();
@@ -278,12 +254,8 @@ bool TouchstoneParser::ReadNoiseData(bool firstStimulus) {
   bool haveStimulus = firstStimulus;
   for (;;) {
     if (!haveStimulus) {
-      const std::string_view token = m_scanner.NextToken();
+      const std::string_view token = m_scanner.NextValueToken();
       if (token.empty()) return true;
-      if (token.front() == '!') {
-        m_scanner.CommentText(token);
-        continue;
-      }
       if (token.front() == '[') {
         m_scanner.Rewind(token);
         std::string name;

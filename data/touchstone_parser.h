@@ -45,7 +45,9 @@ class TouchstoneParser {
   bool ReadKeywordValue(const std::string& name);
   bool ReadNetworkData();
   bool ReadAfterDeclaredPoints();
-  bool ReadDataKeyword(std::string_view token, bool& stop);
+  // With `token` a keyword among the data: reads [End], or the [Noise Data] section that
+  // follows its keyword, either of which ends the data; false for any other keyword.
+  bool ReadDataKeyword(std::string_view token);
   // Reads noise records; `firstStimulus` is true when the stimulus token of the first record
   // has already been read.
   bool ReadNoiseData(bool firstStimulus);

@@ -20,6 +20,11 @@ inline bool IsDigit(char c) {
   return c >= '0' && c <= '9';
 }
 
+// Sets *marked when `comment` contains a non-empty `marker`.
+void NoteMarker(std::string_view comment, std::string_view marker, bool* marked) {
+  if (marked && !marker.empty() && comment.find(marker) != std::string_view::npos) *marked = true;
+}
+
 // Strips a stream-style leading '+' and rejects what a stream would not start a number with
 // (from_chars alone would also take "inf", "nan" and a doubled sign after the '+').
 bool PrepareNumber(std::string_view& token) {
@@ -76,10 +81,7 @@ char TouchstoneScanner::PeekLineStart(std::string_view marker, bool* marked) {
       continue;
     }
     if (*m_pos == '!') {
-      const std::string_view comment = RestOfLine();
-      if (marked && !marker.empty() && comment.find(marker) != std::string_view::npos) {
-        *marked = true;
-      }
+      NoteMarker(RestOfLine(), marker, marked);
       continue;
     }
     return *m_pos;
@@ -117,6 +119,11 @@ std::string_view TouchstoneScanner::NextToken() {
   if (m_pos != m_end) ++m_pos;
   while (m_pos != m_end && !IsSpace(*m_pos) && *m_pos != '!') ++m_pos;
   return std::string_view(start, static_cast<std::size_t>(m_pos - start));
+}
+
+void TouchstoneScanner::SkipComment(std::string_view comment, std::string_view marker,
+                                    bool* marked) {
+  NoteMarker(CommentText(comment), marker, marked);
 }
 
 bool TouchstoneScanner::SkipToKeywordLine() {

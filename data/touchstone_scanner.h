@@ -37,6 +37,16 @@ class TouchstoneScanner {
   // The next token, crossing line breaks; empty at end of text. A token ends at white space
   // or at a '!' that is not its first character (a comment may follow a value directly).
   std::string_view NextToken();
+  // NextToken() past any comments, each read to the end of its line; empty at end of text.
+  // `*marked` becomes true when a skipped comment contains `marker`.
+  // Inline: it runs once per value of every data record.
+  std::string_view NextValueToken(std::string_view marker = {}, bool* marked = nullptr) {
+    for (;;) {
+      const std::string_view token = NextToken();
+      if (token.empty() || token.front() != '!') return token;
+      SkipComment(token, marker, marked);
+    }
+  }
 
   // Moves to the next line that starts (after blanks) with '[', leaving the position on the
   // '['. The current line is never taken. Returns false at end of text.
@@ -49,6 +59,9 @@ class TouchstoneScanner {
   void Rewind(std::string_view token) { m_pos = token.data(); }
 
  private:
+  // CommentText(comment), setting `*marked` when the text contains a non-empty `marker`.
+  void SkipComment(std::string_view comment, std::string_view marker, bool* marked);
+
   const char* m_pos;
   const char* m_end;
   int m_line = 1;

@@ -11,10 +11,10 @@
 #include <cmath>
 #include <cstddef>
 #include <cstdint>
-#include <cstring>
 #include <limits>
 #include <vector>
 
+#include "fuzz_input.h"
 #include "lumen/interpolation/circular_interpolation.h"
 #include "lumen/interpolation/linear_interpolation.h"
 #include "lumen/platform/lumen_exception.h"
@@ -22,27 +22,11 @@
 namespace {
 
 using namespace LumenUtility;
-
-class Reader {
- public:
-  Reader(const std::uint8_t* data, std::size_t size) : m_data(data), m_size(size) {}
-  std::uint8_t Byte() { return m_pos < m_size ? m_data[m_pos++] : 0; }
-  float Float() {
-    std::uint8_t bytes[4] = {Byte(), Byte(), Byte(), Byte()};
-    float v;
-    std::memcpy(&v, bytes, sizeof v);
-    return v;
-  }
-
- private:
-  const std::uint8_t* m_data;
-  std::size_t m_size;
-  std::size_t m_pos = 0;
-};
+using lumen_fuzz::FuzzInput;
 
 // Values by shape: 0 ascending with repeats, 1 descending with repeats, 2 unordered small
 // integers (many repeats), 3 ascending with a NaN or infinity, 4 raw floats from the input.
-std::vector<double> MakeValues(int count, std::uint8_t shape, Reader& in) {
+std::vector<double> MakeValues(int count, std::uint8_t shape, FuzzInput& in) {
   std::vector<double> v(count);
   double current = 1e6 * (in.Byte() % 4) + 0.5 * (in.Byte() % 3);
   for (int i = 0; i < count; ++i) {
@@ -75,7 +59,7 @@ std::vector<double> MakeValues(int count, std::uint8_t shape, Reader& in) {
 
 // The values cut into segments: mostly explicit, sometimes a linear, log or fixed segment
 // spanning the same ends (log only for positive ends).
-InputArray MakeStimulus(const std::vector<double>& values, Reader& in) {
+InputArray MakeStimulus(const std::vector<double>& values, FuzzInput& in) {
   InputArray stimulus;
   std::size_t start = 0;
   while (start < values.size()) {
@@ -111,7 +95,7 @@ void ResampleLinearly(const InputArray& oldStimulus, const InputArray& newStimul
 }  // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
-  Reader in(data, size);
+  FuzzInput in(data, size);
   const std::uint8_t oldShape = in.Byte(), newShape = in.Byte();
   const int oldCount = in.Byte() % 40, newCount = in.Byte() % 40;
   const auto type = static_cast<InterpolateType>(in.Byte() % 3);

@@ -9,34 +9,11 @@
 #include <string>
 #include <vector>
 
+#include "fuzz_input.h"
 #include "lumen/core.h"
 
-namespace {
-
-class Reader {
- public:
-  Reader(const std::uint8_t* data, std::size_t size) : m_data(data), m_size(size) {}
-  template <typename T>
-  T Take() {
-    T value{};
-    if (m_size >= sizeof(T)) {
-      std::memcpy(&value, m_data, sizeof(T));
-      m_data += sizeof(T);
-      m_size -= sizeof(T);
-    }
-    return value;
-  }
-  std::size_t Left() const { return m_size; }
-
- private:
-  const std::uint8_t* m_data;
-  std::size_t m_size;
-};
-
-}  // namespace
-
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* bytes, std::size_t size) {
-  Reader in(bytes, size);
+  lumen_fuzz::FuzzInput in(bytes, size);
   const double start = in.Take<double>();
   const double low = in.Take<double>();
   const double high = in.Take<double>();

@@ -8,34 +8,18 @@
 #include <cmath>
 #include <cstddef>
 #include <cstdint>
-#include <cstring>
 #include <limits>
 #include <vector>
 
+#include "fuzz_input.h"
 #include "lumen/interpolation/tarn_interpolation.h"
 
 namespace {
 
+using lumen_fuzz::FuzzInput;
 using LumenUtility::TsComplex;
 
-class Reader {
- public:
-  Reader(const std::uint8_t* data, std::size_t size) : m_data(data), m_size(size) {}
-  std::uint8_t Byte() { return m_pos < m_size ? m_data[m_pos++] : 0; }
-  float Float() {
-    std::uint8_t bytes[4] = {Byte(), Byte(), Byte(), Byte()};
-    float v;
-    std::memcpy(&v, bytes, sizeof v);
-    return v;
-  }
-
- private:
-  const std::uint8_t* m_data;
-  std::size_t m_size;
-  std::size_t m_pos = 0;
-};
-
-std::vector<double> MakeStimulus(int count, std::uint8_t shape, Reader& in) {
+std::vector<double> MakeStimulus(int count, std::uint8_t shape, FuzzInput& in) {
   std::vector<double> x(count);
   const double first = 1.0e6 * (shape >> 4), step = 1.0e5 * ((shape >> 4) + 1);
   for (int i = 0; i < count; ++i) x[i] = first + step * i;
@@ -61,7 +45,7 @@ std::vector<double> MakeStimulus(int count, std::uint8_t shape, Reader& in) {
   return x;
 }
 
-double GridLimit(std::uint8_t choice, const std::vector<double>& x, Reader& in) {
+double GridLimit(std::uint8_t choice, const std::vector<double>& x, FuzzInput& in) {
   const double lo = x.empty() ? 0.0 : x.front(), hi = x.empty() ? 1.0 : x.back();
   switch (choice % 8) {
     case 0:
@@ -86,7 +70,7 @@ double GridLimit(std::uint8_t choice, const std::vector<double>& x, Reader& in) 
 }  // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
-  Reader in(data, size);
+  FuzzInput in(data, size);
   const std::uint8_t shape = in.Byte();
   const int count = static_cast<int>(in.Byte() % 48) - 2;  // -2 .. 45
   const int points = static_cast<int>((in.Byte() | (in.Byte() << 8)) % 1200) - 2;

@@ -1,10 +1,10 @@
-#include <fstream>
 #include <iostream>
 #include <memory>
 #include <stdexcept>
 #include <string>
 #include <vector>
 
+#include "lumenutil/snp_command_io.h"
 #include "lumenutil/snp_commands.h"
 #include "lumenutil/snp_file.h"
 #include "lumenutil/trace_format.h"
@@ -67,9 +67,7 @@ void Export(const ExportOptions& options) {
     WriteTable(options, std::cout);
     return;
   }
-  std::ofstream out(options.output);
-  if (!out) throw std::runtime_error(options.output + ": cannot be written");
-  WriteTable(options, out);
+  WriteOutputFile(options.output, [&](std::ostream& out) { WriteTable(options, out); });
 }
 
 }  // namespace
@@ -93,10 +91,7 @@ void AddSnpExportCommand(CLI::App& snp) {
       ->capture_default_str();
   command->add_option("--limit,-n", options->limit, "only the first N points")
       ->check(CLI::NonNegativeNumber);
-  command
-      ->add_option("--ports", options->ports,
-                   "port count of a version 1 file whose name does not end in .sNp")
-      ->check(CLI::Range(1, CSnPFileBase::kMaxPorts));
+  AddPortsOption(*command, options->ports);
   command->add_option("--output,-o", options->output, "output file (default: standard output)");
   command->callback([options] { Export(*options); });
 }

@@ -103,13 +103,13 @@ std::string Shortest(float value) {
 StimulusAxis AxisOf(ResultType type) {
   switch (type) {
     case RESULT_SEC:
-      return {"Time", "s", "time_s", true};
+      return {"Time", "s", "time_s", true, "SEC"};
     case RESULT_DBM:
-      return {"Power", "dBm", "power_dBm", false};
+      return {"Power", "dBm", "power_dBm", false, "DBM"};
     case RESULT_POINT:
-      return {"Point", "", "point", false};
+      return {"Point", "", "point", false, "POINT"};
     default:
-      return {"Frequency", "Hz", "frequency_Hz", true};
+      return {"Frequency", "Hz", "frequency_Hz", true, "HZ"};
   }
 }
 

@@ -40,6 +40,7 @@ struct StimulusAxis {
   std::string unit;      // "Hz", "s", "dBm", ""
   std::string column;    // CSV header: "frequency_Hz", ...
   bool siPrefix;         // whether values take engineering prefixes (1.5 GHz)
+  std::string token;     // the unit on a Touchstone option line: "HZ", "SEC", "DBM", "POINT"
 };
 StimulusAxis AxisOf(ResultType type);
 

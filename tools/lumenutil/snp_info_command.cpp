@@ -2,6 +2,7 @@
 #include <memory>
 #include <string>
 
+#include "lumenutil/snp_command_io.h"
 #include "lumenutil/snp_commands.h"
 #include "lumenutil/snp_file.h"
 
@@ -86,10 +87,7 @@ void AddSnpInfoCommand(CLI::App& snp) {
                          "stimulus range, value form, reference, layout, noise data");
   auto options = std::make_shared<InfoOptions>();
   command->add_option("FILE", options->path, "Touchstone file")->required();
-  command
-      ->add_option("--ports", options->ports,
-                   "port count of a version 1 file whose name does not end in .sNp")
-      ->check(CLI::Range(1, CSnPFileBase::kMaxPorts));
+  AddPortsOption(*command, options->ports);
   command->callback([options] { PrintInfo(*options); });
 }
 

@@ -1,10 +1,9 @@
 #include <cmath>
-#include <fstream>
 #include <memory>
-#include <stdexcept>
 #include <string>
 #include <vector>
 
+#include "lumenutil/snp_command_io.h"
 #include "lumenutil/snp_commands.h"
 #include "lumenutil/snp_file.h"
 #include "lumenutil/svg_chart.h"
@@ -83,8 +82,7 @@ std::string Render(const PlotOptions& options) {
 
 void Plot(const PlotOptions& options) {
   const std::string svg = Render(options);
-  std::ofstream out(options.output, std::ios::binary);
-  if (!(out << svg)) throw std::runtime_error(options.output + ": cannot be written");
+  WriteOutputFile(options.output, [&](std::ostream& out) { out << svg; });
 }
 
 }  // namespace
@@ -103,10 +101,7 @@ void AddSnpPlotCommand(CLI::App& snp) {
   command->add_option("--params,-p", options->params,
                       "comma-separated traces, e.g. S21,S11 (default: all; for smith, the "
                       "reflections S11, S22, ...)");
-  command
-      ->add_option("--ports", options->ports,
-                   "port count of a version 1 file whose name does not end in .sNp")
-      ->check(CLI::Range(1, CSnPFileBase::kMaxPorts));
+  AddPortsOption(*command, options->ports);
   command->callback([options] { Plot(*options); });
 }
 

@@ -1,4 +1,3 @@
-#include <fstream>
 #include <iostream>
 #include <memory>
 #include <stdexcept>
@@ -7,6 +6,7 @@
 #include "lumen/platform.h"
 #include "lumen/stimulus.h"
 #include "lumenutil/engineering_value.h"
+#include "lumenutil/snp_command_io.h"
 #include "lumenutil/snp_commands.h"
 #include "lumenutil/snp_file.h"
 #include "lumenutil/touchstone_writer.h"
@@ -66,15 +66,13 @@ void Resample(const ResampleOptions& options) {
   if (options.holdEnds) file.ExtroplateReadSNPFile(target);
   file.InterpolateReadSNPFile(target, true);
 
-  std::ofstream out(options.output, std::ios::binary);
-  if (!out) throw std::runtime_error(options.output + ": cannot be written");
   const std::string comment =
       "Resampled by lumenutil from " + options.path + " onto " + std::to_string(options.points) +
       (options.log ? " logarithmic" : " linear") + " points, " +
       WithUnit(start, axis.unit, axis.siPrefix) + " to " +
       WithUnit(stop, axis.unit, axis.siPrefix) + (options.holdEnds ? ", end values held" : "");
-  WriteTouchstoneV1(file, comment, out, std::cerr);
-  if (!out.flush()) throw std::runtime_error(options.output + ": writing failed");
+  WriteOutputFile(options.output,
+                  [&](std::ostream& out) { WriteTouchstoneV1(file, comment, out, std::cerr); });
 }
 
 }  // namespace
@@ -97,10 +95,7 @@ void AddSnpResampleCommand(CLI::App& snp) {
                     "where the sweep reaches beyond the file, hold each trace's end values");
   command->add_option("--output,-o", options->output, "Touchstone file to write (OUT.sNp)")
       ->required();
-  command
-      ->add_option("--ports", options->ports,
-                   "port count of a version 1 file whose name does not end in .sNp")
-      ->check(CLI::Range(1, CSnPFileBase::kMaxPorts));
+  AddPortsOption(*command, options->ports);
   command->callback([options] { Resample(*options); });
 }
 

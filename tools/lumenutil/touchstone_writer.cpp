@@ -7,22 +7,10 @@
 #include <vector>
 
 #include "lumenutil/snp_file.h"
+#include "lumenutil/trace_format.h"
 
 namespace lumenutil {
 namespace {
-
-const char* UnitToken(ResultType type) {
-  switch (type) {
-    case RESULT_SEC:
-      return "SEC";
-    case RESULT_DBM:
-      return "DBM";
-    case RESULT_POINT:
-      return "POINT";
-    default:
-      return "HZ";
-  }
-}
 
 void WritePair(std::ostream& out, const LumenUtility::TsComplex& v) {
   out << ' ' << Shortest(v.re) << ' ' << Shortest(v.im);
@@ -50,7 +38,7 @@ void WriteNoise(const CSnPFileBase& file, double lastNetworkStimulus, std::ostre
   for (int i = 0; i < records; ++i) {
     // The reader stores 10^(NFmin/10) as a magnitude and Rn in ohms.
     const double nfDb = 10.0 * std::log10(nf.GetData()[i].re);
-    const double angle = gamma.GetData()[i].Phase() * 57.29577951308232;
+    const double angle = gamma.GetData()[i].Phase() * kDegreesPerRadian;
     char line[160];
     std::snprintf(line, sizeof line, " %.9g %.9g %.9g %.9g", nfDb, gamma.GetData()[i].Mag(), angle,
                   r != 0 ? rn.GetData()[i].re / r : 0.0);
@@ -66,7 +54,7 @@ void WriteTouchstoneV1(const CSnPFileBase& file, const std::string& comment, std
   const int n = file.GetSNPType();
   std::istringstream lines(comment);
   for (std::string line; std::getline(lines, line);) out << "! " << line << '\n';
-  out << "# " << UnitToken(file.GetResultType()) << ' ' << info.parameter << " RI R "
+  out << "# " << AxisOf(file.GetResultType()).token << ' ' << info.parameter << " RI R "
       << Shortest(info.referenceResistance) << '\n';
   const std::vector<double> x = file.GetParam(SNP_S11).GetStimulus().GetArray();
   const auto value = [&](int row, int column, std::size_t i) {

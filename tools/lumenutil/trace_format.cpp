@@ -7,11 +7,6 @@
 using LumenUtility::TsComplex;
 
 namespace lumenutil {
-namespace {
-
-constexpr double kDegreesPerRadian = 57.29577951308232;
-
-}  // namespace
 
 const std::vector<std::string>& TraceFormatNames() {
   static const std::vector<std::string> names = {"ri",     "ma",  "db", "logmag", "phase",

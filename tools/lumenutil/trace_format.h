@@ -9,6 +9,9 @@
 
 namespace lumenutil {
 
+// 180 / pi, for angles shown in degrees.
+constexpr double kDegreesPerRadian = 57.29577951308232;
+
 enum class TraceFormat { kRI, kMA, kDB, kLogMag, kPhase, kUnwrappedPhase, kSWR, kZ, kY };
 
 // The --format names: ri ma db logmag phase uphase swr z y.

@@ -2,15 +2,7 @@
 # Runs `lumenutil snp info` and `snp export` on the bundled example and on small broken
 # files, checking what an engineer would read. Usage: snp_commands_test.sh LUMENUTIL SOURCE_DIR
 set -uo pipefail
-tool=$1
-example=$2/testdata/bandpass_filter.s2p
-work=$(mktemp -d)
-trap 'rm -rf "$work"' EXIT
-failures=0
-fail() { echo "FAIL: $*"; failures=$((failures + 1)); }
-expect_line() {  # expect_line TEXT REGEX
-  grep -Eq -- "$2" <<<"$1" || fail "no line matching '$2' in:"$'\n'"$1"
-}
+source "$(dirname "$0")/tool_test_common.sh"
 
 info=$("$tool" snp info "$example") || fail "info exited with $?"
 expect_line "$info" '^version +1$'

@@ -3,11 +3,8 @@
 # (rsvg-convert) turns each picture into a PNG of the stated size. Exits 77 (skipped) when
 # rsvg-convert is not installed. Usage: snp_plot_render_test.sh LUMENUTIL SOURCE_DIR
 set -euo pipefail
-tool=$1
-example=$2/testdata/bandpass_filter.s2p
 command -v rsvg-convert >/dev/null || { echo "rsvg-convert not installed"; exit 77; }
-work=$(mktemp -d)
-trap 'rm -rf "$work"' EXIT
+source "$(dirname "$0")/tool_test_common.sh"
 for format in logmag phase smith; do
   "$tool" snp plot "$example" --format "$format" -o "$work/$format.svg"
   grep -q '<polyline' "$work/$format.svg"

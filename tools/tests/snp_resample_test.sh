@@ -2,12 +2,7 @@
 # Runs `lumenutil snp resample` and reads its output back: the version 1 writer must give the
 # reader the very numbers it started from. Usage: snp_resample_test.sh LUMENUTIL SOURCE_DIR
 set -uo pipefail
-tool=$1
-example=$2/testdata/bandpass_filter.s2p
-work=$(mktemp -d)
-trap 'rm -rf "$work"' EXIT
-failures=0
-fail() { echo "FAIL: $*"; failures=$((failures + 1)); }
+source "$(dirname "$0")/tool_test_common.sh"
 same_export() {  # same_export A B [export options...]: identical RI tables
   local a=$1 b=$2
   shift 2
