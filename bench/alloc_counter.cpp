@@ -25,9 +25,21 @@ AllocationTotals CurrentAllocations() {
 
 }  // namespace lumen_bench
 
-void* operator new(std::size_t size) { return lumen_bench::CountedAllocate(size); }
-void* operator new[](std::size_t size) { return lumen_bench::CountedAllocate(size); }
-void operator delete(void* p) noexcept { std::free(p); }
-void operator delete[](void* p) noexcept { std::free(p); }
-void operator delete(void* p, std::size_t) noexcept { std::free(p); }
-void operator delete[](void* p, std::size_t) noexcept { std::free(p); }
+void* operator new(std::size_t size) {
+  return lumen_bench::CountedAllocate(size);
+}
+void* operator new[](std::size_t size) {
+  return lumen_bench::CountedAllocate(size);
+}
+void operator delete(void* p) noexcept {
+  std::free(p);
+}
+void operator delete[](void* p) noexcept {
+  std::free(p);
+}
+void operator delete(void* p, std::size_t) noexcept {
+  std::free(p);
+}
+void operator delete[](void* p, std::size_t) noexcept {
+  std::free(p);
+}

@@ -35,27 +35,61 @@ TsComplex TsComplex::operator-(const TsComplex& b) const {
 TsComplex TsComplex::operator*(const TsComplex& b) const {
   return TsComplex(double{re} * b.re - double{im} * b.im, double{re} * b.im + double{im} * b.re);
 }
-TsComplex TsComplex::operator/(const TsComplex& b) const { return Divide(re, im, b.re, b.im); }
-TsComplex TsComplex::operator-() const { return TsComplex(-re, -im); }
-TsComplex& TsComplex::operator+=(const TsComplex& b) { return *this = *this + b; }
-TsComplex& TsComplex::operator-=(const TsComplex& b) { return *this = *this - b; }
-TsComplex& TsComplex::operator*=(const TsComplex& b) { return *this = *this * b; }
-TsComplex& TsComplex::operator/=(const TsComplex& b) { return *this = *this / b; }
+TsComplex TsComplex::operator/(const TsComplex& b) const {
+  return Divide(re, im, b.re, b.im);
+}
+TsComplex TsComplex::operator-() const {
+  return TsComplex(-re, -im);
+}
+TsComplex& TsComplex::operator+=(const TsComplex& b) {
+  return *this = *this + b;
+}
+TsComplex& TsComplex::operator-=(const TsComplex& b) {
+  return *this = *this - b;
+}
+TsComplex& TsComplex::operator*=(const TsComplex& b) {
+  return *this = *this * b;
+}
+TsComplex& TsComplex::operator/=(const TsComplex& b) {
+  return *this = *this / b;
+}
 
-TsComplex TsComplex::operator+(double x) const { return TsComplex(re + x, im); }
-TsComplex TsComplex::operator-(double x) const { return TsComplex(re - x, im); }
-TsComplex TsComplex::operator*(double x) const { return TsComplex(re * x, im * x); }
-TsComplex TsComplex::operator/(double x) const { return TsComplex(re / x, im / x); }
-TsComplex& TsComplex::operator+=(double x) { return *this = *this + x; }
-TsComplex& TsComplex::operator-=(double x) { return *this = *this - x; }
-TsComplex& TsComplex::operator*=(double x) { return *this = *this * x; }
-TsComplex& TsComplex::operator/=(double x) { return *this = *this / x; }
+TsComplex TsComplex::operator+(double x) const {
+  return TsComplex(re + x, im);
+}
+TsComplex TsComplex::operator-(double x) const {
+  return TsComplex(re - x, im);
+}
+TsComplex TsComplex::operator*(double x) const {
+  return TsComplex(re * x, im * x);
+}
+TsComplex TsComplex::operator/(double x) const {
+  return TsComplex(re / x, im / x);
+}
+TsComplex& TsComplex::operator+=(double x) {
+  return *this = *this + x;
+}
+TsComplex& TsComplex::operator-=(double x) {
+  return *this = *this - x;
+}
+TsComplex& TsComplex::operator*=(double x) {
+  return *this = *this * x;
+}
+TsComplex& TsComplex::operator/=(double x) {
+  return *this = *this / x;
+}
 
-double TsComplex::Mag() const { return std::hypot(double{re}, double{im}); }
+double TsComplex::Mag() const {
+  return std::hypot(double{re}, double{im});
+}
 
-double TsComplex::LinearMag() const { return std::sqrt(double{re} * re + double{im} * im); }
+double TsComplex::LinearMag() const {
+  return std::sqrt(double{re} * re + double{im} * im);
+}
 
-double TsComplex::LogMag() const { return LogMag(m_logMagZeroValue); }
+double TsComplex::LogMag() const {
+  return LogMag(m_logMagZeroValue);
+}
 
 double TsComplex::LogMag(double zeroValue) const {
   const double power = double{re} * re + double{im} * im;
@@ -92,7 +126,9 @@ double TsComplex::SWR() const {
   return (1.0 + m) / std::abs(1.0 - m);
 }
 
-TsComplex TsComplex::Conjugate() const { return TsComplex(re, -im); }
+TsComplex TsComplex::Conjugate() const {
+  return TsComplex(re, -im);
+}
 
 TsComplex TsComplex::Sqrt() const {
   const double r = std::sqrt(Mag());
@@ -133,7 +169,9 @@ double TsComplex::Y_Inductance(double z0, double freq, bool& isCapacitance) cons
   return -1.0 / (susceptance * omega);
 }
 
-TsComplex TsComplex::FromLogMag(double dB) { return TsComplex(std::pow(10.0, dB * 0.05), 0.0); }
+TsComplex TsComplex::FromLogMag(double dB) {
+  return TsComplex(std::pow(10.0, dB * 0.05), 0.0);
+}
 
 TsComplex TsComplex::FromLogMagPhase(double dB, double phase) {
   return FromMagPhase(std::pow(10.0, dB * 0.05), phase);
@@ -143,7 +181,9 @@ TsComplex TsComplex::FromMagPhase(double mag, double phase) {
   return TsComplex(mag * std::cos(phase), mag * std::sin(phase));
 }
 
-double TsComplex::GetLogMagZeroValue() { return m_logMagZeroValue; }
+double TsComplex::GetLogMagZeroValue() {
+  return m_logMagZeroValue;
+}
 
 double TsComplex::SetLogMagZeroValue(double v) {
   const double previous = m_logMagZeroValue;

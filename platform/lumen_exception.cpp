@@ -4,7 +4,9 @@
 
 #include "lumen/platform/text_conversion.h"
 
-LumenException::LumenException(HRESULT code) : m_code(code) { RebuildWhat(); }
+LumenException::LumenException(HRESULT code) : m_code(code) {
+  RebuildWhat();
+}
 
 LumenException::LumenException(HRESULT code, std::wstring message) : m_code(code) {
   m_messages.push_back(std::move(message));
@@ -23,7 +25,9 @@ void LumenException::AddMessage(std::wstring message) {
   RebuildWhat();
 }
 
-const char* LumenException::what() const noexcept { return m_what.c_str(); }
+const char* LumenException::what() const noexcept {
+  return m_what.c_str();
+}
 
 void LumenException::RebuildWhat() {
   char code[16];

@@ -5,9 +5,13 @@ namespace {
 
 constexpr char32_t kReplacement = 0xFFFD;
 
-bool IsSurrogate(char32_t c) { return c >= 0xD800 && c <= 0xDFFF; }
+bool IsSurrogate(char32_t c) {
+  return c >= 0xD800 && c <= 0xDFFF;
+}
 
-char32_t Sanitize(char32_t c) { return (IsSurrogate(c) || c > 0x10FFFF) ? kReplacement : c; }
+char32_t Sanitize(char32_t c) {
+  return (IsSurrogate(c) || c > 0x10FFFF) ? kReplacement : c;
+}
 
 void AppendUtf8(std::string& out, char32_t c) {
   c = Sanitize(c);

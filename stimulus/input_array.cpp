@@ -22,17 +22,25 @@ const std::vector<Segment>& EmptySegments() {
 
 InputArray::InputArray() : m_size(0) {}
 
-InputArray::InputArray(const Segment& s) : InputArray() { SetArray(s); }
+InputArray::InputArray(const Segment& s) : InputArray() {
+  SetArray(s);
+}
 
-InputArray::InputArray(double value, int n) : InputArray() { SetArray(value, n); }
+InputArray::InputArray(double value, int n) : InputArray() {
+  SetArray(value, n);
+}
 
 InputArray::InputArray(double start, double stop, int n, SegmentType t) : InputArray() {
   SetArray(start, stop, n, t);
 }
 
-InputArray::InputArray(const std::vector<double>& v) : InputArray() { SetArray(v); }
+InputArray::InputArray(const std::vector<double>& v) : InputArray() {
+  SetArray(v);
+}
 
-InputArray::InputArray(const double* p, unsigned int n) : InputArray() { SetArray(p, n); }
+InputArray::InputArray(const double* p, unsigned int n) : InputArray() {
+  SetArray(p, n);
+}
 
 double InputArray::operator[](unsigned int i) const {
   if (i >= m_size || !m_pSegments) throw LumenException(E_FAIL, L"index");
@@ -219,15 +227,21 @@ void InputArray::SetArray(const Segment& s) {
   m_pSegments->front().SetCache(nullptr, 0);
 }
 
-void InputArray::SetArray(double value, int n) { SetArray(Segment(value, CheckedCount(n))); }
+void InputArray::SetArray(double value, int n) {
+  SetArray(Segment(value, CheckedCount(n)));
+}
 
 void InputArray::SetArray(double start, double stop, int n, SegmentType t) {
   SetArray(Segment(start, stop, CheckedCount(n), t));
 }
 
-void InputArray::SetArray(const std::vector<double>& v) { SetArray(Segment(v)); }
+void InputArray::SetArray(const std::vector<double>& v) {
+  SetArray(Segment(v));
+}
 
-void InputArray::SetArray(const double* p, unsigned int n) { SetArray(Segment(p, n)); }
+void InputArray::SetArray(const double* p, unsigned int n) {
+  SetArray(Segment(p, n));
+}
 
 void InputArray::push_back(const Segment& s) {
   MutableSegments().push_back(s);
@@ -295,9 +309,13 @@ InputArray& InputArray::operator*=(double x) {
   return *this;
 }
 
-InputArray InputArray::operator+(double x) const { return InputArray(*this) += x; }
+InputArray InputArray::operator+(double x) const {
+  return InputArray(*this) += x;
+}
 
-InputArray InputArray::operator*(double x) const { return InputArray(*this) *= x; }
+InputArray InputArray::operator*(double x) const {
+  return InputArray(*this) *= x;
+}
 
 void InputArray::operator+=(const InputArray& other) {
   const std::vector<Segment> appended = other.GetSegments();  // `other` may be *this

@@ -84,9 +84,13 @@ bool InputArray::Resize(int n) {
   return true;
 }
 
-void InputArray::OptimizeRepresentation() { AdoptRunsIfSimpler(true); }
+void InputArray::OptimizeRepresentation() {
+  AdoptRunsIfSimpler(true);
+}
 
-void InputArray::OptimizeRepresentationOnlyFixed() { AdoptRunsIfSimpler(false); }
+void InputArray::OptimizeRepresentationOnlyFixed() {
+  AdoptRunsIfSimpler(false);
+}
 
 void InputArray::AdoptRunsIfSimpler(bool linearRuns) {
   if (m_size == 0) return;

@@ -183,12 +183,12 @@ TEST(InputArray, SubsetAndShapeQuestions) {
   const InputArray other(0.5, 9.95, 10, Linear);
   EXPECT_FALSE(range.IsSubsetOf(other, 0));
   EXPECT_TRUE(range.IsSubsetOf(other, 0.1));
-  EXPECT_FALSE(InputArray(std::vector<double>{1, 2, 2}).IsExactSubset(
-      InputArray(std::vector<double>{1, 2, 3})));
-  EXPECT_TRUE(InputArray(std::vector<double>{1, 2, 2}).IsExactSubset(
-      InputArray(std::vector<double>{2, 1, 2, 5})));
-  EXPECT_FALSE(InputArray(std::vector<double>{NAN}).IsExactSubset(
-      InputArray(std::vector<double>{NAN})));
+  EXPECT_FALSE(InputArray(std::vector<double>{1, 2, 2})
+                   .IsExactSubset(InputArray(std::vector<double>{1, 2, 3})));
+  EXPECT_TRUE(InputArray(std::vector<double>{1, 2, 2})
+                  .IsExactSubset(InputArray(std::vector<double>{2, 1, 2, 5})));
+  EXPECT_FALSE(
+      InputArray(std::vector<double>{NAN}).IsExactSubset(InputArray(std::vector<double>{NAN})));
 
   EXPECT_TRUE(InputArray(std::vector<double>{3, 2, 2, 1}).IsMonotonic());
   EXPECT_FALSE(InputArray(std::vector<double>{1, 3, 2, 4}).IsMonotonic());
@@ -247,8 +247,8 @@ TEST(InputArray, TextFormRoundTripsAndIsExact) {
 
 TEST(InputArray, MalformedTextFailsAndLeavesTarget) {
   const InputArray kept(1, 2, 2, Linear);
-  for (const wchar_t* bad : {L"LIN,2,1,2", L"(LIN,2,1,2", L"(LIN,2,1,2]", L"(XYZ,1,1)",
-                             L"(ARB,99999999,1,2)", L"("}) {
+  for (const wchar_t* bad :
+       {L"LIN,2,1,2", L"(LIN,2,1,2", L"(LIN,2,1,2]", L"(XYZ,1,1)", L"(ARB,99999999,1,2)", L"("}) {
     std::wistringstream text(bad);
     InputArray target = kept;
     text >> target;

@@ -38,7 +38,8 @@ void ComputeLogPoints(double start, double stop, int numPts, double* out) {
   const double step = (std::log10(stop) - lo) / (numPts - 1);
   const double low = std::min(start, stop);
   const double high = std::max(start, stop);
-  for (int i = 1; i < numPts - 1; ++i) out[i] = std::clamp(std::pow(10.0, lo + i * step), low, high);
+  for (int i = 1; i < numPts - 1; ++i)
+    out[i] = std::clamp(std::pow(10.0, lo + i * step), low, high);
   out[numPts - 1] = stop;
 }
 

@@ -26,13 +26,17 @@ double LinearPoint(double start, double stop, unsigned int n, unsigned int i) {
 
 Segment::Segment() : m_start(0), m_stop(0), m_numPoints(0), m_type(Linear), m_offset(0) {}
 
-Segment::Segment(double value, unsigned int n) : Segment() { SetSegment(value, n); }
+Segment::Segment(double value, unsigned int n) : Segment() {
+  SetSegment(value, n);
+}
 
 Segment::Segment(double start, double stop, unsigned int n, SegmentType t) : Segment() {
   SetSegment(start, stop, n, t);
 }
 
-Segment::Segment(const std::vector<double>& v) : Segment() { SetSegment(v); }
+Segment::Segment(const std::vector<double>& v) : Segment() {
+  SetSegment(v);
+}
 
 Segment::Segment(const double* p, unsigned int n) : Segment() {
   m_type = Arbitrary;
@@ -63,7 +67,9 @@ void Segment::SetSegment(const std::vector<double>& v) {
   m_offset = 0;
 }
 
-void Segment::clear() { *this = Segment(); }
+void Segment::clear() {
+  *this = Segment();
+}
 
 bool Segment::IsFixed() const {
   switch (m_type) {
@@ -230,8 +236,8 @@ bool Segment::operator==(const Segment& other) const {
 
 template <typename Change>
 void Segment::ChangeArbitraryPoints(Change change) {
-  const bool solePlainOwner = m_pCache.use_count() == 1 && m_offset == 0 &&
-                              m_pCache->size() == m_numPoints;
+  const bool solePlainOwner =
+      m_pCache.use_count() == 1 && m_offset == 0 && m_pCache->size() == m_numPoints;
   if (!solePlainOwner) {
     m_pCache = MakePoints(CachedPoints(), m_numPoints);
     m_offset = 0;
@@ -265,9 +271,13 @@ Segment& Segment::operator*=(double x) {
   return *this;
 }
 
-Segment Segment::operator+(double x) const { return Segment(*this) += x; }
+Segment Segment::operator+(double x) const {
+  return Segment(*this) += x;
+}
 
-Segment Segment::operator*(double x) const { return Segment(*this) *= x; }
+Segment Segment::operator*(double x) const {
+  return Segment(*this) *= x;
+}
 
 void Segment::reverse() {
   if (m_numPoints == 0 || m_type == Fixed) return;

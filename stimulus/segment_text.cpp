@@ -12,7 +12,9 @@ namespace {
 constexpr const wchar_t* kTokens[] = {L"LIN", L"LOG", L"FIX", L"ARB"};
 
 // Consumes the one separator character that follows a field.
-void SkipSeparator(std::wistream& is) { is.get(); }
+void SkipSeparator(std::wistream& is) {
+  is.get();
+}
 
 }  // namespace
 

@@ -11,7 +11,9 @@ using HRESULT = std::int32_t;
 
 namespace LumenUtility {
 
-constexpr HRESULT MakeHResult(std::uint32_t bits) { return static_cast<HRESULT>(bits); }
+constexpr HRESULT MakeHResult(std::uint32_t bits) {
+  return static_cast<HRESULT>(bits);
+}
 
 inline constexpr HRESULT S_OK = 0;
 inline constexpr HRESULT S_FALSE = 1;
@@ -29,7 +31,11 @@ inline constexpr HRESULT LUMEN_E_UNKNOWN_VERSION = MakeHResult(0xE8080867);
 // A vector kernel could not obtain its temporary buffer.
 inline constexpr HRESULT LUMEN_E_KERNEL_BUFFER = MakeHResult(0xE8040453);
 
-constexpr bool Failed(HRESULT hr) { return hr < 0; }
-constexpr bool Succeeded(HRESULT hr) { return hr >= 0; }
+constexpr bool Failed(HRESULT hr) {
+  return hr < 0;
+}
+constexpr bool Succeeded(HRESULT hr) {
+  return hr >= 0;
+}
 
 }  // namespace LumenUtility

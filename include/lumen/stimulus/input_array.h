@@ -33,12 +33,32 @@ class LUMEN_API InputArray {
     const_iterator(unsigned int index, const InputArray* array) : m_index(index), m_array(array) {}
     double operator*() const { return (*m_array)[m_index]; }
     double operator[](difference_type n) const { return (*m_array)[m_index + n]; }
-    const_iterator& operator++() { ++m_index; return *this; }
-    const_iterator operator++(int) { const_iterator old = *this; ++m_index; return old; }
-    const_iterator& operator--() { --m_index; return *this; }
-    const_iterator operator--(int) { const_iterator old = *this; --m_index; return old; }
-    const_iterator& operator+=(difference_type n) { m_index += n; return *this; }
-    const_iterator& operator-=(difference_type n) { m_index -= n; return *this; }
+    const_iterator& operator++() {
+      ++m_index;
+      return *this;
+    }
+    const_iterator operator++(int) {
+      const_iterator old = *this;
+      ++m_index;
+      return old;
+    }
+    const_iterator& operator--() {
+      --m_index;
+      return *this;
+    }
+    const_iterator operator--(int) {
+      const_iterator old = *this;
+      --m_index;
+      return old;
+    }
+    const_iterator& operator+=(difference_type n) {
+      m_index += n;
+      return *this;
+    }
+    const_iterator& operator-=(difference_type n) {
+      m_index -= n;
+      return *this;
+    }
     friend const_iterator operator+(const_iterator it, difference_type n) { return it += n; }
     friend const_iterator operator+(difference_type n, const_iterator it) { return it += n; }
     friend const_iterator operator-(const_iterator it, difference_type n) { return it -= n; }

@@ -24,8 +24,8 @@ class InputArray;
 
 class LUMEN_API Segment {
  public:
-  Segment();                                      // Linear, 0 points
-  Segment(double value, unsigned int n);          // Fixed
+  Segment();                              // Linear, 0 points
+  Segment(double value, unsigned int n);  // Fixed
   Segment(double start, double stop, unsigned int n, SegmentType t);
   explicit Segment(const std::vector<double>& v);  // Arbitrary, private copy
   Segment(const double* p, unsigned int n);        // Arbitrary, private copy
