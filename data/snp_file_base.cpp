@@ -51,8 +51,7 @@ int CSnPFileBase::ReadSNPFile(const std::wstring& path) {
   const std::string narrowPath = LumenUtility::WideToUtf8(path);
   std::unique_ptr<std::FILE, FileCloser> file(std::fopen(narrowPath.c_str(), "rb"));
   if (!file) {
-    m_readError =
-        L"line 0: cannot open the file: " + LumenUtility::Utf8ToWide(std::strerror(errno));
+    m_readError = L"cannot open the file: " + LumenUtility::Utf8ToWide(std::strerror(errno));
     return -1;
   }
   std::string text;
@@ -69,8 +68,7 @@ int CSnPFileBase::ReadSNPFile(const std::wstring& path) {
   }
   text.resize(used);
   if (std::ferror(file.get())) {
-    m_readError =
-        L"line 0: the file cannot be read: " + LumenUtility::Utf8ToWide(std::strerror(errno));
+    m_readError = L"the file cannot be read: " + LumenUtility::Utf8ToWide(std::strerror(errno));
     return -1;
   }
   return ReadSNPText(text);

@@ -48,7 +48,7 @@ class LUMEN_API CSnPFileBase : public CSNParameterS {
   // The same for file contents already in memory.
   int ReadSNPText(std::string_view text);
 
-  // Why the last read failed, as "line N: ..." (line 0 when no line is to blame); empty
+  // Why the last read failed, as "line N: ..." (without a line when none is to blame); empty
   // after a successful read.
   const std::wstring& GetReadError() const { return m_readError; }
   const SnPFileInfo& GetFileInfo() const { return m_info; }
