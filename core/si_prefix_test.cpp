@@ -12,6 +12,7 @@ namespace {
 struct Choice {
   double scale;
   wchar_t prefix;
+  bool operator==(const Choice&) const = default;
 };
 
 Choice Pick(double value, int maxExponent = 24, int minExponent = -24) {
@@ -39,22 +40,17 @@ TEST(SIPrefix, EveryPowerOfAThousandHasItsPrefix) {
 }
 
 TEST(SIPrefix, TruncationTowardZeroAndLimits) {
-  EXPECT_EQ(Pick(1.5e9).prefix, L'G');
-  EXPECT_EQ(Pick(1.5e9).scale, 1e-9);
-  EXPECT_EQ(Pick(0.05).prefix, L'm');
-  EXPECT_EQ(Pick(0.05).scale, 1e3);
-  EXPECT_EQ(Pick(0.5).prefix, L' ');  // log10 0.5 = -0.3 truncates to 0
-  EXPECT_EQ(Pick(0.5).scale, 1.0);
+  EXPECT_EQ(Pick(1.5e9), (Choice{1e-9, L'G'}));
+  EXPECT_EQ(Pick(0.05), (Choice{1e3, L'm'}));
+  EXPECT_EQ(Pick(0.5), (Choice{1.0, L' '}));  // log10 0.5 = -0.3 truncates to 0
   EXPECT_EQ(Pick(999e-6).prefix, L'm');
   EXPECT_EQ(Pick(999e3).prefix, L'k');
   EXPECT_EQ(Pick(0.0).prefix, L' ');
-  EXPECT_EQ(Pick(1e9, 6).prefix, L'M');
-  EXPECT_EQ(Pick(1e9, 6).scale, 1e-6);
+  EXPECT_EQ(Pick(1e9, 6), (Choice{1e-6, L'M'}));
   EXPECT_EQ(Pick(1e9, 8).prefix, L'M');  // limits are cut to multiples of 3 toward zero
   EXPECT_EQ(Pick(1e-12, 24, -7).prefix, L'\u00B5');
   EXPECT_EQ(Pick(1e40).prefix, L'Y');
-  EXPECT_EQ(Pick(1e-40).prefix, L'y');
-  EXPECT_EQ(Pick(1e-40).scale, 1e24);
+  EXPECT_EQ(Pick(1e-40), (Choice{1e24, L'y'}));
   EXPECT_EQ(Pick(5.0, 100, 90).prefix, L'Y');  // limits beyond the table
   EXPECT_EQ(Pick(5.0, -90, -100).prefix, L'y');
   EXPECT_EQ(Pick(std::numeric_limits<double>::quiet_NaN()).prefix, L' ');

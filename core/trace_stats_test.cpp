@@ -19,6 +19,12 @@ Stats Of(const std::vector<double>& v) {
   return s;
 }
 
+// mean, deviation, min, max and mean square of `v`, in that order.
+std::vector<double> All(const std::vector<double>& v) {
+  const Stats s = Of(v);
+  return {s.mean, s.stdDev, s.min, s.max, s.meanSquare};
+}
+
 TEST(TraceStats, SmallSamplesGiveTheTextbookValues) {
   const float values[] = {1, 2, 3, 4};
   float mean, stdDev, min, max, meanSquare;
@@ -29,21 +35,10 @@ TEST(TraceStats, SmallSamplesGiveTheTextbookValues) {
   EXPECT_EQ(max, 4.0f);
   EXPECT_FLOAT_EQ(meanSquare, 7.5f);
 
-  const Stats one = Of({-3.0});
-  EXPECT_EQ(one.mean, -3.0);
-  EXPECT_EQ(one.stdDev, 0.0);
-  EXPECT_EQ(one.min, -3.0);
-  EXPECT_EQ(one.max, -3.0);
-  EXPECT_EQ(one.meanSquare, 9.0);
-
-  const Stats descending = Of({5, -1, 2});
-  EXPECT_EQ(descending.min, -1.0);
-  EXPECT_EQ(descending.max, 5.0);
-
-  const Stats empty = Of({});  // writes nothing
-  EXPECT_EQ(empty.mean, -1);
-  EXPECT_EQ(empty.stdDev, -1);
-  EXPECT_EQ(empty.min, -1);
+  EXPECT_EQ(All({-3.0}), (std::vector<double>{-3, 0, -3, -3, 9}));
+  EXPECT_EQ(All({5, -1, 2})[2], -1.0);
+  EXPECT_EQ(All({5, -1, 2})[3], 5.0);
+  EXPECT_EQ(All({}), std::vector<double>(5, -1));  // writes nothing
 }
 
 TEST(TraceStats, DeviationSurvivesALargeOffset) {

@@ -7,6 +7,7 @@
 #include <cmath>
 #include <cstring>
 #include <limits>
+#include <vector>
 
 namespace LumenUtility {
 namespace {
@@ -19,10 +20,7 @@ TEST(TsComplex, LayoutIsTwoFloatsRealFirst) {
   const TsComplex values[2] = {TsComplex(1.5, -2.5), TsComplex(3.0, 4.0)};
   float raw[4];
   std::memcpy(raw, values, sizeof raw);
-  EXPECT_EQ(raw[0], 1.5f);
-  EXPECT_EQ(raw[1], -2.5f);
-  EXPECT_EQ(raw[2], 3.0f);
-  EXPECT_EQ(raw[3], 4.0f);
+  EXPECT_EQ(std::vector<float>(raw, raw + 4), (std::vector<float>{1.5f, -2.5f, 3.0f, 4.0f}));
 }
 
 TEST(TsComplex, ArithmeticRoundsDoubleResultToFloat) {
@@ -43,17 +41,14 @@ TEST(TsComplex, ArithmeticRoundsDoubleResultToFloat) {
   EXPECT_EQ((TsComplex(0.1) * 3.0).re, static_cast<float>(double{0.1f} * 3.0));
 }
 
-TEST(TsComplex, DivisionByZeroFollowsTheGuardForComplexAndIeeeForReal) {
+TEST(TsComplex, DivisionByZeroAndNanEquality) {
   EXPECT_EQ(TsComplex(1, 2) / TsComplex(), TsComplex());
   const TsComplex inf = TsComplex(1, -1) / 0.0;
   EXPECT_TRUE(std::isinf(inf.re) && inf.re > 0);
   EXPECT_TRUE(std::isinf(inf.im) && inf.im < 0);
   EXPECT_TRUE(std::isnan((TsComplex() / 0.0).re));
-}
-
-TEST(TsComplex, EqualityIsExactAndFalseForNan) {
+  // Equality is exact and false for NaN.
   const float nan = std::numeric_limits<float>::quiet_NaN();
-  EXPECT_NE(TsComplex(1, nan), TsComplex(1, nan));
   EXPECT_FALSE(TsComplex(1, nan) == TsComplex(1, nan));
   EXPECT_NE(TsComplex(1, 0), TsComplex(std::nextafter(1.0f, 2.0f), 0));
 }
@@ -63,18 +58,13 @@ TEST(TsComplex, LogMagOfZeroUsesTheProcessWideZeroValue) {
   EXPECT_EQ(TsComplex().LogMag(), -200.0);
   EXPECT_EQ(TsComplex().LogMag(-300.0), -300.0);
   EXPECT_NEAR(TsComplex(1e-30).LogMag(), -600.0, 1e-6);  // tiny (as float), not zero
-  EXPECT_EQ(TsComplex(1).LogMag(), 0.0);
   EXPECT_EQ(TsComplex(0, 1).LogMag(), 0.0);
   EXPECT_DOUBLE_EQ(TsComplex(10).LogMag(), 20.0);
   EXPECT_EQ(TsComplex::SetLogMagZeroValue(-150), -200.0);
   EXPECT_EQ(TsComplex::SetLogMagZeroValue(-150), -150.0);
   EXPECT_EQ(TsComplex().LogMag(), -150.0);
   EXPECT_EQ(TsComplex().LogDBM(), -150.0);
-}
-
-TEST(TsComplex, Minus200dBConstant) {
-  EXPECT_EQ(TsComplex::m_minus200dB.re, 7.0710678e-11f);
-  EXPECT_EQ(TsComplex::m_minus200dB.im, 7.0710678e-11f);
+  EXPECT_EQ(TsComplex::m_minus200dB, TsComplex(7.0710678e-11f, 7.0710678e-11f));
   EXPECT_NEAR(TsComplex::m_minus200dB.LogMag(), -200.0, 1e-5);
 }
 
@@ -85,16 +75,12 @@ TEST(TsComplex, PhaseOnTheImaginaryAxisAndBranchCut) {
   EXPECT_DOUBLE_EQ(TsComplex(1, 1).Phase(), kPi / 4);
 }
 
-TEST(TsComplex, MagnitudeFormsAndSwr) {
-  EXPECT_EQ(TsComplex(3, 4).Mag(), 5.0);
+TEST(TsComplex, MagnitudeSwrAndPowerFormats) {
   EXPECT_EQ(TsComplex(3, 4).LinearMag(), 5.0);
   EXPECT_EQ(TsComplex(3e30f, 4e30f).Mag(), std::hypot(double{3e30f}, double{4e30f}));
   EXPECT_EQ(TsComplex().SWR(), 1.0);
   EXPECT_DOUBLE_EQ(TsComplex(0, 0.5).SWR(), 3.0);
   EXPECT_TRUE(std::isinf(TsComplex(1).SWR()));
-}
-
-TEST(TsComplex, PowerFormats) {
   EXPECT_NEAR(TsComplex(10).LinearWatt(), 0.1, 1e-8);  // 0.001 is a float constant
   EXPECT_DOUBLE_EQ(TsComplex(-10).LinearVolt(), -std::sqrt(5.0));
   EXPECT_NEAR(TsComplex(10).LinearAmpere(), std::sqrt(100 * 0.00002), 1e-8);
@@ -109,9 +95,7 @@ TEST(TsComplex, ImpedanceAndAdmittance) {
   EXPECT_EQ(TsComplex(-1).Impedance(TsComplex(50)), TsComplex(0, 0));
   EXPECT_EQ(TsComplex(1).Impedance(TsComplex(50)), TsComplex(0, 0));  // division guard
   EXPECT_EQ(TsComplex().Impedance(TsComplex(50, 10)), TsComplex(50, -10));
-  const TsComplex y = TsComplex().Admittance(TsComplex(50));
-  EXPECT_FLOAT_EQ(y.re, 0.02f);
-  EXPECT_EQ(y.im, 0.0f);
+  EXPECT_EQ(TsComplex().Admittance(TsComplex(50)), TsComplex(0.02f, 0));
   // Gamma = 1/3 is 100 ohms.
   EXPECT_FLOAT_EQ(TsComplex(1.0 / 3).Impedance(TsComplex(50)).re, 100.0f);
 }
@@ -146,8 +130,7 @@ TEST(TsComplex, FactoriesAndSqrt) {
   const TsComplex j2 = TsComplex::FromMagPhase(2, kPi / 2);
   EXPECT_NEAR(j2.re, 0.0, 1e-7);
   EXPECT_FLOAT_EQ(j2.im, 2.0f);
-  const TsComplex polar = TsComplex::FromLogMagPhase(20, kPi);
-  EXPECT_FLOAT_EQ(polar.re, -10.0f);
+  EXPECT_FLOAT_EQ(TsComplex::FromLogMagPhase(20, kPi).re, -10.0f);
   const TsComplex root = TsComplex(-4, 0).Sqrt();
   EXPECT_NEAR(root.re, 0.0, 1e-7);
   EXPECT_FLOAT_EQ(root.im, 2.0f);

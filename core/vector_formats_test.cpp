@@ -74,14 +74,9 @@ TEST(VectorFormats, SquareInvertAndProductAgree) {
   }
 }
 
-TEST(VectorFormats, UnwrappedPhaseTakesBackEachWrap) {
-  std::vector<TsComplex> data;
-  for (int k = 0; k < 5; ++k) data.push_back(Unit(0.9 * kPi * k));
-  std::vector<float> phase(5);
-  ASSERT_EQ(FormatUnwrappedPhase(data.data(), phase.data(), 0, 5), S_OK);
-  for (int k = 0; k < 5; ++k) EXPECT_NEAR(phase[k], 0.9 * kPi * k, 2e-6) << k;
-
-  // Descending through -pi, with the TsComplex::Phase rule for a zero real part.
+TEST(VectorFormats, UnwrappedPhaseDescendsThroughMinusPi) {
+  // With the TsComplex::Phase rule for a zero real part.
+  std::vector<float> phase(3);
   const std::vector<TsComplex> down = {TsComplex(0, -1), TsComplex(-1, 0.01), TsComplex(0, 0)};
   ASSERT_EQ(FormatUnwrappedPhase(down.data(), phase.data(), 0, 3), S_OK);
   EXPECT_FLOAT_EQ(phase[0], -kPi / 2);
@@ -159,13 +154,10 @@ TEST(VectorFormats, SqrtKeepsTheBranchContinuous) {
     }
   }
 
-  std::vector<TsComplex> empty;
+  std::vector<TsComplex> empty, negative = {TsComplex(-4, 0)};
   Sqrt(empty);
-  EXPECT_TRUE(empty.empty());
-  std::vector<TsComplex> negative = {TsComplex(-4, 0)};
   Sqrt(negative);
-  EXPECT_NEAR(negative[0].re, 0.0, 1e-6);
-  EXPECT_NEAR(negative[0].im, 2.0, 1e-6);
+  EXPECT_LT((negative[0] - TsComplex(0, 2)).Mag(), 1e-6);
 }
 
 TEST(VectorFormats, SqrtExRecoversTheRootOfADelayLine) {
@@ -200,12 +192,10 @@ TEST(VectorFormats, SqrtExLeavesDegenerateInputsAsSqrtDoes) {
   std::vector<TsComplex> flat = data;  // equal end points: slope 0/0
   SqrtEx(InputArray(5.0, 2), 3.0f, flat);
   EXPECT_EQ(flat, plain);
-  std::vector<TsComplex> noStimulus = data;
+  std::vector<TsComplex> noStimulus = data, empty;
   SqrtEx(InputArray(), 3.0f, noStimulus);
   EXPECT_EQ(noStimulus, plain);
-  std::vector<TsComplex> empty;
   SqrtEx(InputArray(1.0, 2.0, 2, Linear), 0.0f, empty);
-  EXPECT_TRUE(empty.empty());
 }
 
 }  // namespace
