@@ -33,11 +33,9 @@ TEST(InputArray, ReadsAcrossSegments) {
   EXPECT_EQ(a.size(), 7u);
   EXPECT_EQ(a.GetArray(), (std::vector<double>{1, 2, 3, 5, 5, 7, 9}));
   EXPECT_EQ(std::vector<double>(a.begin(), a.end()), a.GetArray());
-  EXPECT_EQ(a.end() - a.begin(), 7);
   EXPECT_EQ(MessageOf([&] { a[7]; }), L"index");
   EXPECT_EQ(a.GetSegmentFromPtIndex(4).GetType(), Fixed);
-  EXPECT_EQ(MessageOf([&] { a.GetSegmentFromPtIndex(7); }), L"index");
-  EXPECT_EQ(MessageOf([&] { a.GetSegmentFromPtIndex(-1); }), L"index");
+  for (int bad : {7, -1}) EXPECT_EQ(MessageOf([&] { a.GetSegmentFromPtIndex(bad); }), L"index");
   EXPECT_EQ(MessageOf([&] { a.GetSegment(3); }), L"segIndex");
   EXPECT_EQ(a.min_element(), 1);
   EXPECT_EQ(a.max_element(), 9);
@@ -51,7 +49,6 @@ TEST(InputArray, FlattenedCacheServesArrayAndSegmentsWithTheSameValues) {
   ASSERT_NE(raw, nullptr);
   EXPECT_EQ(std::vector<double>(raw, raw + a.size()), before);
   EXPECT_EQ(a.GetArrayPtr().get()->data(), raw);  // one shared vector
-  EXPECT_EQ(a.GetSegments()[2].at(1), 9);
   EXPECT_EQ(InputArray().GetRawArray(), nullptr);
 }
 
@@ -91,8 +88,7 @@ TEST(InputArray, SegmentListEditing) {
   InputArray empty;
   empty.pop_back();
   empty.reverse();
-  EXPECT_EQ(MessageOf([&] { empty.min_element(); }).find(L"no segments") != std::wstring::npos,
-            true);
+  EXPECT_NE(MessageOf([&] { empty.min_element(); }).find(L"no segments"), std::wstring::npos);
 }
 
 TEST(InputArray, OptimizeRepresentationFindsLinearRuns) {
@@ -104,8 +100,7 @@ TEST(InputArray, OptimizeRepresentationFindsLinearRuns) {
 
   InputArray b(std::vector<double>{0, 1, 5, 6, 20});
   b.OptimizeRepresentation();
-  ASSERT_EQ(b.NumSegments(), 3u);
-  EXPECT_TRUE(b.GetSegment(2).GetType() == Fixed && b.GetSegment(2).front() == 20);
+  EXPECT_EQ(b.GetSegment(2), Segment(20.0, 1));
 
   InputArray c(std::vector<double>{1, 2.004, 3.006});
   c.OptimizeRepresentation();
@@ -140,7 +135,6 @@ TEST(InputArray, SplitSegmentKeepsTypeAndRejectsBadSplitPoints) {
   EXPECT_DOUBLE_EQ(log.GetSegment(0).back(), 10);
   EXPECT_DOUBLE_EQ(log.GetSegment(1).front(), 100);
   EXPECT_EQ(log.GetSegment(1).back(), 1000);
-  EXPECT_EQ(log.size(), 4u);
 
   InputArray arb(std::vector<double>{4, 1, 3});
   arb.SplitSegment(0, 1);
@@ -194,11 +188,11 @@ TEST(InputArray, SubsetAndShapeQuestions) {
   EXPECT_FALSE(InputArray(std::vector<double>{1, 3, 2, 4}).IsMonotonic());
   EXPECT_FALSE(InputArray().IsMonotonic());
   EXPECT_TRUE(InputArray(4.0, 3).IsConstant());
-  InputArray twoConstants(4.0, 3);
-  twoConstants.push_back(Segment(4.0, 2));
-  EXPECT_TRUE(twoConstants.IsConstant());
-  twoConstants.push_back(Segment(5.0, 1));
-  EXPECT_FALSE(twoConstants.IsConstant());
+  InputArray constants(4.0, 3);
+  constants.push_back(Segment(4.0, 2));
+  EXPECT_TRUE(constants.IsConstant());
+  constants.push_back(Segment(5.0, 1));
+  EXPECT_FALSE(constants.IsConstant());
   EXPECT_TRUE(range.IsRamp());
   EXPECT_FALSE(ThreeSegmentArray().IsRamp());
 
