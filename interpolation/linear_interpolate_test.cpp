@@ -41,21 +41,18 @@ TEST(LinearInterpolateArray, InterpolatesAndReadsNoNeighbourAtWholeIndex) {
 
 TEST(LinearInterpolateVector, EmptyAndOutOfRangeIndicesStayInsideTheVector) {
   EXPECT_EQ(LinearInterpolate(std::vector<double>{}, 1.5), 0.0);
-  EXPECT_EQ(LinearInterpolate(std::vector<float>{}, 1.5), 0.0f);
   EXPECT_EQ(LinearInterpolate(std::vector<TsComplex>{}, 1.5), TsComplex(0, 0));
 
   const std::vector<double> values{10, 20, 30};
   EXPECT_EQ(LinearInterpolate(values, 0.25), 12.5);
-  EXPECT_EQ(LinearInterpolate(values, 2.5), 30.0);
-  EXPECT_EQ(LinearInterpolate(values, 1e300), 30.0);
+  for (double past : {2.5, 1e300}) EXPECT_EQ(LinearInterpolate(values, past), 30.0) << past;
   EXPECT_EQ(LinearInterpolate(values, -0.5), 10.0);
   EXPECT_TRUE(std::isnan(LinearInterpolate(values, kNaN)));
 
   const std::vector<TsComplex> complex{{1, -1}, {3, 5}};
   EXPECT_EQ(LinearInterpolate(complex, -3.0), complex.front());
   EXPECT_EQ(LinearInterpolate(complex, 0.5), TsComplex(2, 2));
-  EXPECT_EQ(LinearInterpolate(complex, 1.0), complex.back());
-  EXPECT_EQ(LinearInterpolate(complex, 7.5), complex.back());
+  for (double past : {1.0, 7.5}) EXPECT_EQ(LinearInterpolate(complex, past), complex.back());
   const TsComplex nan = LinearInterpolate(complex, kNaN);
   EXPECT_TRUE(std::isnan(nan.re) && std::isnan(nan.im));
 }
@@ -63,9 +60,7 @@ TEST(LinearInterpolateVector, EmptyAndOutOfRangeIndicesStayInsideTheVector) {
 TEST(LinearInterpolateStimulus, PullsBackAThousandthPastTheEndAndRejectsTheRest) {
   const InputArray stimulus(100.0, 500.0, 5, Linear);  // 100, 200, ..., 500
   EXPECT_EQ(LinearInterpolate(stimulus, 4.0005), 500.0);
-  EXPECT_EQ(LinearInterpolate(stimulus, 4.0), 500.0);
   EXPECT_EQ(LinearInterpolate(stimulus, 0.0), 100.0);
-  EXPECT_EQ(LinearInterpolate(stimulus, 2.0), 300.0);
   EXPECT_DOUBLE_EQ(LinearInterpolate(stimulus, 3.25), 425.0);
 
   for (double bad : {4.002, -0.1, kNaN, 1e300}) {
@@ -93,7 +88,6 @@ TEST(FindNearestIndex, CrossesSegmentsAndTheGapsBetweenThem) {
   // 0, 1, ..., 10 then a gap to 20, 22, 24.
   InputArray stimulus(0.0, 10.0, 11, Linear);
   stimulus.push_back(Segment(std::vector<double>{20, 22, 24}));
-  EXPECT_EQ(FindNearestIndex(stimulus, 0.0, 3.0), 3.0);
   EXPECT_EQ(FindNearestIndex(stimulus, 0.0, 3.5), 3.5);
   EXPECT_EQ(FindNearestIndex(stimulus, 0.0, 23.0), 12.5);
   // Between the segments: a fraction between overall indices 10 and 11.
@@ -141,11 +135,11 @@ TEST(Direction, IgnoresEqualNeighboursAndRejectsMixedOrEmpty) {
   };
   EXPECT_EQ(direction({1, 2, 2, 3}), SLOPE_ASCENDING);
   EXPECT_EQ(direction({3, 3, 1}), SLOPE_DESCENDING);
-  EXPECT_EQ(direction({1, 3, 2}), SLOPE_MIXED);
-  EXPECT_EQ(direction({3, 1, 2}), SLOPE_MIXED);
+  for (auto mixed : {std::vector<double>{1, 3, 2}, {3, 1, 2}, {}}) {
+    EXPECT_EQ(direction(mixed), SLOPE_MIXED);
+  }
   EXPECT_EQ(direction({5}), SLOPE_ASCENDING);
   EXPECT_EQ(direction({5, 5, 5}), SLOPE_ASCENDING);
-  EXPECT_EQ(direction({}), SLOPE_MIXED);
   EXPECT_EQ(Direction(-1, nullptr), SLOPE_MIXED);
 }
 

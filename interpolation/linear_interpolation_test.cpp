@@ -12,12 +12,19 @@ namespace {
 
 const double kNaN = std::numeric_limits<double>::quiet_NaN();
 
-TEST(LinearInterpolation, EqualStimuliCopyTheInput) {
+TEST(LinearInterpolation, EqualStimuliCopyAndOnePointSpreads) {
   const InputArray stimulus(1e9, 2e9, 11, Linear);
   const std::vector<float> in{1, 2, 3};  // the copy does not look at the length
   std::vector<float> out{9};
   EXPECT_EQ(LinearInterpolation(stimulus, InputArray(stimulus), in, out), INTERP_UNCHANGED);
   EXPECT_EQ(out, in);
+
+  // One old point spreads its value.
+  std::vector<TsComplex> spread;
+  ASSERT_EQ(LinearInterpolation(InputArray(5.0, 1), InputArray(0.0, 10.0, 3, Linear),
+                                std::vector<TsComplex>{{1, 2}}, spread),
+            INTERP_DONE);
+  EXPECT_EQ(spread, std::vector<TsComplex>(3, TsComplex(1, 2)));
 }
 
 TEST(LinearInterpolation, UnorderedOldStimulusLeavesOutputUntouched) {
@@ -49,14 +56,6 @@ TEST(LinearInterpolation, HoldsEndValuesOutsideTheOldRangeInEitherDirection) {
                                 outFalling),
             INTERP_DONE);
   EXPECT_EQ(outFalling, out);
-}
-
-TEST(LinearInterpolation, OnePointStimulusSpreadsItsValue) {
-  std::vector<TsComplex> out;
-  ASSERT_EQ(LinearInterpolation(InputArray(5.0, 1), InputArray(0.0, 10.0, 3, Linear),
-                                std::vector<TsComplex>{{1, 2}}, out),
-            INTERP_DONE);
-  EXPECT_EQ(out, std::vector<TsComplex>(3, TsComplex(1, 2)));
 }
 
 TEST(LinearInterpolation, ResamplesInPlaceAndRejectsShortData) {
