@@ -80,7 +80,6 @@ TEST_F(SnPReaderTest, VersionOneTwoPortPutsSecondPairIntoS21) {
   EXPECT_EQ(s21.GetStartFreq(), 1e9);
   EXPECT_EQ(s21.GetStopFreq(), 2e9);
   ExpectPolar(s21.GetData()[0], 0.1, 90);
-  EXPECT_EQ(reader->GetParam(SNP_S12).GetName(), L"S12");
   ExpectPolar(Value(1, 2), 0.2, 0);
   ExpectPolar(Value(2, 2), 0.4, 45);
   EXPECT_TRUE(reader->Get2PortDataOrder());

@@ -39,8 +39,7 @@ TEST(SnPResampling, InteriorPointsFollowTheArcAndKeepTheName) {
   file.InterpolateReadSNPFile(target, true);
   const CSNParameter& s11 = S11(file);
   EXPECT_EQ(s11.GetName(), L"S11");
-  EXPECT_EQ(s11.GetStartFreq(), 1.5e9);
-  EXPECT_EQ(s11.GetStopFreq(), 2.5e9);
+  EXPECT_EQ(s11.GetStimulus(), target);
   ASSERT_EQ(s11.GetData().size(), 2u);
   // On the circle, not the chord (whose midpoint would have magnitude 0.483).
   ExpectPolar(s11.GetData()[0], 0.5, 15, 1e-5);
@@ -57,9 +56,7 @@ TEST(SnPResampling, SamePointsCopyAndDescendingTargetMirrorsAscending) {
   up.InterpolateReadSNPFile(InputArray(1.2e9, 2.8e9, 5, LumenUtility::Linear), true);
   down.InterpolateReadSNPFile(InputArray(2.8e9, 1.2e9, 5, LumenUtility::Linear), true);
   for (int i = 0; i < 5; ++i) {
-    const TsComplex a = S11(up).GetData()[i], b = S11(down).GetData()[4 - i];
-    EXPECT_NEAR(a.re, b.re, 1e-6);
-    EXPECT_NEAR(a.im, b.im, 1e-6);
+    EXPECT_LT((S11(up).GetData()[i] - S11(down).GetData()[4 - i]).Mag(), 1e-6) << i;
   }
 }
 
@@ -101,7 +98,6 @@ TEST(SnPResampling, ResetDecidesWhatHappensToTheSpareData) {
   EXPECT_EQ(trace.GetSpareData(), std::vector<TsComplex>(3, TsComplex(1, 1)));
   kept.InterpolateReadSNPFile(InputArray(1e9, 3e9, 4, LumenUtility::Linear), true);
   EXPECT_EQ(trace.GetSpareData(), std::vector<TsComplex>(4));
-  EXPECT_EQ(trace.GetName(), L"S11");
 }
 
 TEST(SnPResampling, NoiseTracesKeepTheStimulusTheyWereReadWith) {
@@ -122,7 +118,6 @@ TEST(SnPResampling, EmptyTracesAndEmptyTargetsAreLeftAlone) {
   CSNParameter empty;
   empty.Interpolate(InputArray(1e9, 2e9, 3, LumenUtility::Linear), true);
   EXPECT_TRUE(empty.GetData().empty());
-  EXPECT_EQ(empty.GetNumPoints(), 0);
 
   CSnPFileBase file = ReadOnePort(kArc);
   const CSNParameter before = S11(file);

@@ -93,7 +93,6 @@ TEST(TarnInterpolation, LinearGridPointsUseTheIntervalTheyLieIn) {
 TEST(TarnInterpolation, LinearStimulusRoundedToFloatStillReachesTheGridStop) {
   // 9 GHz is not a float: the stored stimulus ends 512 Hz short of the grid stop.
   const std::vector<float> x{8.0e9f, 8.5e9f, 9.0e9f}, y{1, 2, 3};
-  ASSERT_LT(double{x.back()}, 9.0e9);
   const std::vector<float> out = Linear(y, x, 8.0e9, 9.0e9, 201);
   EXPECT_NEAR(out.back(), 3.0f, 1e-5);
   EXPECT_NEAR(out[100], 2.0f, 1e-5);
@@ -180,7 +179,7 @@ TEST(TarnInterpolation, PhaseCodesOfALongDelayTraceFollowTheTruePhase) {
   }
 }
 
-TEST(TarnCubicInterpolation, ReproducesLinesAndPassesThroughSamples) {
+TEST(TarnCubicInterpolation, ReproducesLinesPassesThroughSamplesAndFollowsCurves) {
   const std::vector<double> x{0, 0.5, 2, 2.25, 4, 7};  // uneven spacing
   std::vector<float> line(x.size()), wave(x.size());
   for (std::size_t i = 0; i < x.size(); ++i) {
@@ -194,19 +193,16 @@ TEST(TarnCubicInterpolation, ReproducesLinesAndPassesThroughSamples) {
   for (std::size_t i = 0; i < x.size(); ++i) {
     EXPECT_FLOAT_EQ(out_wave[static_cast<int>(x[i] * 4)], wave[i]) << x[i];
   }
-}
 
-TEST(TarnCubicInterpolation, FollowsASmoothCurveCloselyOnAFinerGrid) {
-  std::vector<double> x(41);
-  std::vector<float> y(41);
+  // A smooth curve on a finer grid is followed closely.
+  std::vector<double> fx(41);
+  std::vector<float> fy(41);
   for (int i = 0; i < 41; ++i) {
-    x[i] = 1e9 + 2.5e7 * i;
-    y[i] = static_cast<float>(std::cos((x[i] - 1e9) / 1.5e8));
+    fx[i] = 1e9 + 2.5e7 * i;
+    fy[i] = static_cast<float>(std::cos((fx[i] - 1e9) / 1.5e8));
   }
-  const std::vector<float> out = Cubic(y, x, 1e9, 2e9, 1001);
-  for (int k = 0; k < 1001; ++k) {
-    EXPECT_NEAR(out[k], std::cos(k * 1e6 / 1.5e8), 2e-3) << k;
-  }
+  const std::vector<float> out = Cubic(fy, fx, 1e9, 2e9, 1001);
+  for (int k = 0; k < 1001; ++k) EXPECT_NEAR(out[k], std::cos(k * 1e6 / 1.5e8), 2e-3) << k;
 }
 
 TEST(TarnCubicInterpolation, HoldsTheEndSamplesOutsideTheStimulus) {
@@ -242,9 +238,7 @@ TEST(TarnCubicInterpolation, UnwrapsPhaseAndDividesTheOperand) {
   for (int k = 0; k < 5; ++k) {
     EXPECT_NEAR(resampled[k].Mag(), 2.0, 1e-6) << k;
     EXPECT_GT(rphase[k], 2.7f) << k;
-    const TsComplex back = result[k] * resampled[k];
-    EXPECT_NEAR(back.re, 0.0, 1e-5) << k;
-    EXPECT_NEAR(back.im, 4.0, 1e-5) << k;
+    EXPECT_LT((result[k] * resampled[k] - TsComplex(0, 4)).Mag(), 1e-5) << k;
   }
 
   // Without phase the trace is real; a zero magnitude divides to 0, not infinity.
