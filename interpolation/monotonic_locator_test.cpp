@@ -103,14 +103,10 @@ InputArray RandomNewStimulus(std::mt19937& rng, const InputArray& old) {
   return InputArray(points);
 }
 
-std::string Describe(const InputArray& stimulus) {
-  std::ostringstream text;
+std::wstring Describe(const InputArray& stimulus) {
+  std::wostringstream text;
   text.precision(17);
-  for (const Segment& segment : stimulus.GetSegments()) {
-    text << "[type " << segment.GetType() << ":";
-    for (unsigned int k = 0; k < segment.size(); ++k) text << " " << segment.at(k);
-    text << "] ";
-  }
+  text << stimulus;
   return text.str();
 }
 
@@ -121,6 +117,7 @@ TEST(MonotonicLocator, ChoosesTheSameCrossingAsThePlainSearch) {
   for (int trial = 0; trial < 3000; ++trial) {
     const InputArray old = RandomOrderedStimulus(rng);
     const InputArray fresh = RandomNewStimulus(rng, old);
+    SCOPED_TRACE(Describe(old));
     MonotonicLocator locator(old);
     // Distinct data per point, so a different crossing shows in the output.
     std::vector<double> in(old.size());
@@ -131,19 +128,17 @@ TEST(MonotonicLocator, ChoosesTheSameCrossingAsThePlainSearch) {
     }
     std::vector<double> out;
     std::vector<TsComplex> complexOut;
-    ASSERT_EQ(LinearInterpolation(old, fresh, in, out), INTERP_DONE) << Describe(old);
-    ASSERT_EQ(LinearInterpolation(old, fresh, complexIn, complexOut), INTERP_DONE) << Describe(old);
+    ASSERT_EQ(LinearInterpolation(old, fresh, in, out), INTERP_DONE);
+    ASSERT_EQ(LinearInterpolation(old, fresh, complexIn, complexOut), INTERP_DONE);
     for (unsigned int k = 0; k < fresh.size(); ++k) {
       const double index = PlainSearch(old, fresh[k]);
-      ASSERT_EQ(FindNearestIndex(old, 0.0, fresh[k]), index)
-          << Describe(old) << " value " << fresh[k];
-      ASSERT_EQ(locator.Find(fresh[k]), index) << Describe(old) << " value " << fresh[k];
-      ASSERT_EQ(out[k], LinearInterpolate(in, index)) << Describe(old) << " value " << fresh[k];
-      ASSERT_EQ(complexOut[k], LinearInterpolate(complexIn, index))
-          << Describe(old) << " " << fresh[k];
+      ASSERT_EQ(FindNearestIndex(old, 0.0, fresh[k]), index) << "value " << fresh[k];
+      ASSERT_EQ(locator.Find(fresh[k]), index) << "value " << fresh[k];
+      ASSERT_EQ(out[k], LinearInterpolate(in, index)) << "value " << fresh[k];
+      ASSERT_EQ(complexOut[k], LinearInterpolate(complexIn, index)) << "value " << fresh[k];
     }
     // Every answer came from the bisection, none from the plain search standing in.
-    ASSERT_EQ(locator.PlainSearchFallbacks(), 0u) << Describe(old);
+    ASSERT_EQ(locator.PlainSearchFallbacks(), 0u);
   }
 }
 

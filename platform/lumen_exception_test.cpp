@@ -12,14 +12,11 @@ TEST(LumenException, MessageAloneCarriesTheBoundsCode) {
   EXPECT_STREQ(e.what(), "0xE8080882: couldn't load driver");
 }
 
-TEST(LumenException, CodeWithoutMessageHasEmptyList) {
+TEST(LumenException, CodeWithoutMessageHasEmptyListAndIsCaughtAsStdException) {
   const LumenException e(LumenUtility::LUMEN_E_UNKNOWN_VERSION);
   EXPECT_TRUE(e.GetMessages().empty());
   EXPECT_EQ(e.GetMessage(), L"");
   EXPECT_STREQ(e.what(), "0xE8080867");
-}
-
-TEST(LumenException, IsThrownAndCaughtByValue) {
   try {
     throw LumenException(LumenUtility::E_FAIL, L"index");
   } catch (const std::exception& e) {

@@ -16,10 +16,7 @@ TEST(TextConversion, MalformedUtf8BecomesReplacementCharacter) {
   EXPECT_EQ(Utf8ToWide("a\xC3"), L"a\uFFFD");        // truncated sequence
   EXPECT_EQ(Utf8ToWide("\xC0\xAF"), L"\uFFFD");      // overlong "/"
   EXPECT_EQ(Utf8ToWide("\xED\xA0\x80"), L"\uFFFD");  // encoded surrogate
-  EXPECT_EQ(Utf8ToWide("\xFF"
-                       "b"),
-            L"\uFFFD"
-            L"b");                                       // impossible lead byte
+  EXPECT_EQ(Utf8ToWide(std::string("\xFF") + "b"), L"\uFFFDb");  // impossible lead byte
   EXPECT_EQ(Utf8ToWide("\xF4\x90\x80\x80"), L"\uFFFD");  // past U+10FFFF
 }
 

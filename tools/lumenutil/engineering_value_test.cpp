@@ -6,9 +6,9 @@ namespace lumenutil {
 namespace {
 
 TEST(EngineeringValue, NumbersTakeAPrefixAndTheUnit) {
-  EXPECT_EQ(ParseEngineeringValue("2.4e9", "Hz"), 2.4e9);
-  EXPECT_EQ(ParseEngineeringValue("2.4G", "Hz"), 2.4e9);
-  EXPECT_EQ(ParseEngineeringValue("2.4 GHz", "Hz"), 2.4e9);
+  for (const char* text : {"2.4e9", "2.4G", "2.4 GHz"}) {
+    EXPECT_EQ(ParseEngineeringValue(text, "Hz"), 2.4e9) << text;
+  }
   EXPECT_EQ(ParseEngineeringValue("800mhz", "Hz"), 0.8);  // m is milli, as written
   EXPECT_EQ(ParseEngineeringValue("800MHZ", "Hz"), 800e6);
   EXPECT_EQ(ParseEngineeringValue("5 \xC2\xB5s", "s"), 5e-6);

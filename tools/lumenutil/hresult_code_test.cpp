@@ -13,14 +13,11 @@ constexpr std::int32_t Bits(std::uint32_t bits) {
 }
 
 TEST(ParseHResultCode, HexAndDecimalSpellingsOfOneCodeAgree) {
-  EXPECT_EQ(ParseHResultCode("0xE8080882"), Bits(0xE8080882));
-  EXPECT_EQ(ParseHResultCode("0Xe8080882"), Bits(0xE8080882));
-  EXPECT_EQ(ParseHResultCode("0x00000000e8080882"), Bits(0xE8080882));  // leading zeros
-  EXPECT_EQ(ParseHResultCode("3892840578"), Bits(0xE8080882));
-  EXPECT_EQ(ParseHResultCode("-402126718"), Bits(0xE8080882));
-  EXPECT_EQ(ParseHResultCode("0"), 0);
-  EXPECT_EQ(ParseHResultCode("0x0"), 0);
-  EXPECT_EQ(ParseHResultCode("-0"), 0);
+  for (const char* text :
+       {"0xE8080882", "0Xe8080882", "0x00000000e8080882", "3892840578", "-402126718"}) {
+    EXPECT_EQ(ParseHResultCode(text), Bits(0xE8080882)) << text;
+  }
+  for (const char* zero : {"0", "0x0", "-0"}) EXPECT_EQ(ParseHResultCode(zero), 0) << zero;
   EXPECT_EQ(ParseHResultCode("0100"), 100);  // decimal, not octal
 }
 
@@ -29,10 +26,10 @@ TEST(ParseHResultCode, LimitsOfThirtyTwoBits) {
   EXPECT_EQ(ParseHResultCode("4294967295"), -1);
   EXPECT_EQ(ParseHResultCode("-2147483648"), Bits(0x80000000));
   EXPECT_EQ(ParseHResultCode("2147483648"), Bits(0x80000000));
-  EXPECT_EQ(ParseHResultCode("0x100000000"), std::nullopt);
-  EXPECT_EQ(ParseHResultCode("4294967296"), std::nullopt);
-  EXPECT_EQ(ParseHResultCode("-2147483649"), std::nullopt);
-  EXPECT_EQ(ParseHResultCode("99999999999999999999999"), std::nullopt);  // past 64 bits
+  // The last is past 64 bits.
+  for (const char* text : {"0x100000000", "4294967296", "-2147483649", "99999999999999999999999"}) {
+    EXPECT_EQ(ParseHResultCode(text), std::nullopt) << text;
+  }
 }
 
 TEST(ParseHResultCode, RejectsMalformedText) {
