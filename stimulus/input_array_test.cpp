@@ -28,7 +28,7 @@ std::wstring MessageOf(const std::function<void()>& f) {
   return L"nothing thrown";
 }
 
-TEST(InputArray, ReadsAcrossSegments) {
+TEST(InputArray, ReadsAcrossSegmentsDirectlyAndThroughTheFlattenedCache) {
   const InputArray a = ThreeSegmentArray();
   EXPECT_EQ(a.size(), 7u);
   EXPECT_EQ(a.GetArray(), (std::vector<double>{1, 2, 3, 5, 5, 7, 9}));
@@ -37,18 +37,14 @@ TEST(InputArray, ReadsAcrossSegments) {
   EXPECT_EQ(a.GetSegmentFromPtIndex(4).GetType(), Fixed);
   for (int bad : {7, -1}) EXPECT_EQ(MessageOf([&] { a.GetSegmentFromPtIndex(bad); }), L"index");
   EXPECT_EQ(MessageOf([&] { a.GetSegment(3); }), L"segIndex");
-  EXPECT_EQ(a.min_element(), 1);
-  EXPECT_EQ(a.max_element(), 9);
+  EXPECT_EQ(std::make_pair(a.min_element(), a.max_element()), std::make_pair(1.0, 9.0));
   EXPECT_EQ(MessageOf([] { InputArray()[0]; }), L"index");
-}
 
-TEST(InputArray, FlattenedCacheServesArrayAndSegmentsWithTheSameValues) {
-  const InputArray a = ThreeSegmentArray();
-  const std::vector<double> before = a.GetArray();
+  // The flattened cache serves the same values through one shared vector.
   const double* raw = a.GetRawArray();
   ASSERT_NE(raw, nullptr);
-  EXPECT_EQ(std::vector<double>(raw, raw + a.size()), before);
-  EXPECT_EQ(a.GetArrayPtr().get()->data(), raw);  // one shared vector
+  EXPECT_EQ(std::vector<double>(raw, raw + a.size()), a.GetArray());
+  EXPECT_EQ(a.GetArrayPtr().get()->data(), raw);
   EXPECT_EQ(InputArray().GetRawArray(), nullptr);
 }
 
@@ -172,7 +168,7 @@ TEST(InputArray, ConformSegmentsAlignsBoundaries) {
   EXPECT_NE(MessageOf([&] { ConformSegments(uneven); }), L"nothing thrown");
 }
 
-TEST(InputArray, SubsetAndShapeQuestions) {
+TEST(InputArray, SubsetShapeAndEqualityQuestions) {
   const InputArray range(1, 10, 10, Linear);
   const InputArray other(0.5, 9.95, 10, Linear);
   EXPECT_FALSE(range.IsSubsetOf(other, 0));
@@ -199,9 +195,8 @@ TEST(InputArray, SubsetAndShapeQuestions) {
   std::vector<int> indices = {99};
   ThreeSegmentArray().SplitInputArrayAtValue(3, 5, indices);
   EXPECT_EQ(indices, (std::vector<int>{2, 3, 4}));
-}
 
-TEST(InputArray, EqualityByPointsAcrossRepresentations) {
+  // Equality compares points, whatever the representation.
   EXPECT_EQ(InputArray(0, 4, 5, Linear), InputArray(std::vector<double>{0, 1, 2, 3, 4}));
   EXPECT_NE(InputArray(0, 4, 5, Linear), InputArray(0, 4, 4, Linear));
   EXPECT_EQ(InputArray(), InputArray());
@@ -223,7 +218,7 @@ TEST(InputArray, ResizeOnlyForOneSegment) {
   EXPECT_EQ(arb.size(), 2u);
 }
 
-TEST(InputArray, TextFormRoundTripsAndIsExact) {
+TEST(InputArray, TextFormRoundTripsAndMalformedTextLeavesTheTarget) {
   std::wostringstream out;
   out << InputArray(10e6, 2e9, 201, Linear);
   EXPECT_EQ(out.str(), L"(LIN,201,10000000,2000000000)");
@@ -237,9 +232,8 @@ TEST(InputArray, TextFormRoundTripsAndIsExact) {
   EXPECT_FALSE(text.fail()) << text.str();
   EXPECT_EQ(back, multi);
   EXPECT_EQ(back.NumSegments(), multi.NumSegments());
-}
 
-TEST(InputArray, MalformedTextFailsAndLeavesTarget) {
+  // Malformed text fails and leaves the target as it was.
   const InputArray kept(1, 2, 2, Linear);
   for (const wchar_t* bad :
        {L"LIN,2,1,2", L"(LIN,2,1,2", L"(LIN,2,1,2]", L"(XYZ,1,1)", L"(ARB,99999999,1,2)", L"("}) {

@@ -23,7 +23,7 @@ std::pair<HRESULT, std::wstring> CaughtLumen(F f) {
   return {S_OK, L"nothing thrown"};
 }
 
-TEST(Segment, ConstructionNormalisesTypeAndCount) {
+TEST(Segment, ConstructionNormalisesTypeAndCountAndExtremesFollowThePoints) {
   const Segment single(1e9, 2e9, 1, Linear);
   EXPECT_EQ(single.GetType(), Fixed);
   EXPECT_EQ(single.at(0), 1e9);
@@ -31,6 +31,14 @@ TEST(Segment, ConstructionNormalisesTypeAndCount) {
   EXPECT_EQ(Segment(1, 10, 0, Log).GetType(), Fixed);
   EXPECT_TRUE(Segment().empty());
   EXPECT_EQ(Segment().GetType(), Linear);
+  // Extremes and the fixed test look at the points, whatever the type.
+  EXPECT_TRUE(Segment(std::vector<double>{2, 2, 2}).IsFixed());
+  EXPECT_FALSE(Segment(std::vector<double>{2, 2, 3}).IsFixed());
+  EXPECT_TRUE(Segment(4, 4, 3, Linear).IsFixed());
+  const Segment arb(std::vector<double>{3, -1, 8});
+  EXPECT_EQ(std::make_pair(arb.min_element(), arb.max_element()), std::make_pair(-1.0, 8.0));
+  EXPECT_EQ(Segment(10, 1, 5, Linear).min_element(), 1);
+  EXPECT_TRUE(std::isnan(Segment(std::vector<double>{}).min_element()));
 }
 
 TEST(Segment, LinearPointsHitBothEndsAndLogPointsMirrorWhenDescending) {
@@ -154,18 +162,7 @@ TEST(Segment, ChangingOneCopyLeavesItsSharersAlone) {
   EXPECT_EQ(original.at(2), 3);
 }
 
-TEST(Segment, IsFixedAndExtremes) {
-  EXPECT_TRUE(Segment(std::vector<double>{2, 2, 2}).IsFixed());
-  EXPECT_FALSE(Segment(std::vector<double>{2, 2, 3}).IsFixed());
-  EXPECT_TRUE(Segment(4, 4, 3, Linear).IsFixed());
-  const Segment arb(std::vector<double>{3, -1, 8});
-  EXPECT_EQ(arb.min_element(), -1);
-  EXPECT_EQ(arb.max_element(), 8);
-  EXPECT_EQ(Segment(10, 1, 5, Linear).min_element(), 1);
-  EXPECT_TRUE(std::isnan(Segment(std::vector<double>{}).min_element()));
-}
-
-TEST(Segment, TextFormRoundTrips) {
+TEST(Segment, TextFormRoundTripsAndBadTextLeavesTheSegment) {
   for (const Segment& s : {Segment(std::vector<double>{1, 2, 3}), Segment(1e6, 3e9, 201, Linear),
                            Segment(10, 1000, 3, Log), Segment(7.5, 4), Segment()}) {
     std::wstringstream text;
@@ -179,9 +176,7 @@ TEST(Segment, TextFormRoundTrips) {
   std::wostringstream out;
   out << Segment(std::vector<double>{1, 2.5, 3});
   EXPECT_EQ(out.str(), L"ARB,3,1,2.5,3");
-}
-
-TEST(Segment, TextWithUnknownTokenOrShortDataFailsAndLeavesTheSegment) {
+  // An unknown token or short data fails and leaves the segment.
   for (const wchar_t* bad : {L"LUN,2,1,2", L"", L"ARB,3,1,2", L"LIN,2,1", L"FIX"}) {
     std::wistringstream text(bad);
     Segment s(5.0, 1);
