@@ -11,7 +11,7 @@ namespace {
 
 TEST(NaturalCompare, NumbersCompareByValueAndFractionsDigitByDigit) {
   EXPECT_EQ(strnatcmp(L"x2", L"x10"), -1);
-  EXPECT_EQ(strnatcmp(L"  a\t1 ", L"a1"), 0);  // white space is skipped
+  EXPECT_EQ(strnatcmp(L"  a\t1 ", L"a1"), 0);   // white space is skipped
   EXPECT_EQ(strnatcmp(L"1.010", L"1.02"), -1);  // leading zero: left-aligned
   EXPECT_EQ(strnatcmp(L"x01", L"x1"), -1);
   EXPECT_EQ(strnatcmp(L"x05", L"x050"), -1);  // the run that ends first is smaller
@@ -23,9 +23,8 @@ TEST(NaturalCompare, NumbersCompareByValueAndFractionsDigitByDigit) {
   EXPECT_EQ(strnatcmp(L"", L""), 0);
   EXPECT_EQ(strnatcmp(nullptr, L""), 0);
   EXPECT_EQ(strnatcmp(L"a", nullptr), 1);
-}
 
-TEST(NaturalCompare, NoCaseFoldsLettersOnly) {
+  // The NoCase form folds letters only.
   EXPECT_EQ(strnatcmpNoCase(L"ABC", L"abc"), 0);
   EXPECT_EQ(strnatcmp(L"ABC", L"abc"), -1);
   EXPECT_EQ(strnatcmpNoCase(L"Trace9", L"trace10"), -1);

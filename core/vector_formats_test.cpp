@@ -82,9 +82,7 @@ TEST(VectorFormats, UnwrappedPhaseDescendsThroughMinusPi) {
   EXPECT_FLOAT_EQ(phase[0], -kPi / 2);
   EXPECT_NEAR(phase[1], -kPi - 0.01, 1e-5);
   EXPECT_NEAR(phase[2], -1.5 * kPi, 1e-5);  // 0 + 0j counts as +pi/2
-}
 
-TEST(VectorFormats, UnwrappedPhaseFollowsARandomWalkInOnePassAndInPieces) {
   std::mt19937 rng(7);
   for (int trial = 0; trial < 50; ++trial) {
     const int n = 200;
@@ -160,7 +158,7 @@ TEST(VectorFormats, SqrtKeepsTheBranchContinuous) {
   EXPECT_LT((negative[0] - TsComplex(0, 2)).Mag(), 1e-6);
 }
 
-TEST(VectorFormats, SqrtExRecoversTheRootOfADelayLine) {
+TEST(VectorFormats, SqrtExRecoversTheRootOfADelayLineAndLeavesDegenerateInputsAsSqrtDoes) {
   // Root r(f) = a(f) e^{j(phase0 - 2 pi f tau)}; the data is r^2. Whatever the first point's
   // principal root, the sign decision must give back r itself.
   const double tau = 1e-9;  // s
@@ -182,9 +180,8 @@ TEST(VectorFormats, SqrtExRecoversTheRootOfADelayLine) {
       }
     }
   }
-}
 
-TEST(VectorFormats, SqrtExLeavesDegenerateInputsAsSqrtDoes) {
+  // Degenerate inputs are left as Sqrt leaves them.
   const std::vector<TsComplex> data = {TsComplex(-1, 0.1), TsComplex(-1, -0.1)};
   std::vector<TsComplex> plain = data;
   Sqrt(plain);

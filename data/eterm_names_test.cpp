@@ -17,15 +17,14 @@ TEST(ETermNames, VocabularyIsFixedAndClosedByEmptyEntry) {
   for (int n = 0; n < kETermNameCount; ++n) EXPECT_NE(gETermNames[n][0], L'\0') << n;
 }
 
-TEST(ETermNames, TermPositionsAreOneBased) {
+TEST(ETermNames, PositionsAreOneBasedAndPrefixesComeFirst) {
   EXPECT_EQ(eterm_name(L"LoadMatch", 1, 0), L"LoadMatch(2,1)");
   EXPECT_EQ(eterm_name(L"CrossTalk", 11, 9), L"CrossTalk(12,10)");
   EXPECT_EQ(eterm_name(L"SourceMatch", 3), L"SourceMatch(4)");
   EXPECT_EQ(eterm_name(L"", 0), L"(1)");
   EXPECT_EQ(eterm_name(L"X", INT_MAX, -1), L"X(2147483648,0)");
-}
 
-TEST(ETermNames, ReceiverNamesPutPrefixBeforeTerm) {
+  // Receiver names put the prefix before the term.
   EXPECT_EQ(reference_eterm_name(0, L"Ch1_"), L"Ch1_ResponseTracking(R1)");
   EXPECT_EQ(test_rcv_eterm_name(2, L""), L"ResponseTracking(C)");
   EXPECT_EQ(test_rcv_eterm_name(1, L"p"), L"pResponseTracking(B)");

@@ -66,7 +66,7 @@ TEST(LinearInterpolateUsingMagPhase, MagnitudeIsLinearAndPhaseTakesTheShorterTur
   EXPECT_LT(Distance(across, TsComplex(-1, 0)), 1e-6);
 }
 
-TEST(CircularInterpolation, SameStimulusCopiesEveryPoint) {
+TEST(CircularInterpolation, PointsWithinTheMatchToleranceCopyTheLowerOldValue) {
   const std::vector<double> x = Grid(1e9, 1e6, 7);
   const std::vector<TsComplex> d = OnCircle(7, {0.2f, 0.1f}, 0.5, 0.4);
   for (InterpolateType type : {INTERP_MAG_PHASE, INTERP_CIRCULAR, INTERP_CIRCULAR_NO_PHASE_FIT}) {
@@ -75,17 +75,14 @@ TEST(CircularInterpolation, SameStimulusCopiesEveryPoint) {
     EXPECT_FALSE(r.interpolated);
     EXPECT_EQ(r.out, d);
   }
-}
-
-TEST(CircularInterpolation, PointsWithinTheMatchToleranceTakeTheLowerOldValue) {
   // Old points 0.05 apart at 2 and 2.05: a new point between them, or on the upper one, takes
   // the lower one's value; 0.05 above the last point takes the last value.
-  const std::vector<double> x{0, 1, 2, 2.05, 3, 4};
-  const std::vector<TsComplex> d{{1, 0}, {2, 0}, {3, 1}, {4, 2}, {5, 3}, {6, 4}};
-  const Result r = Resample(x, d, {1.05, 2.02, 2.05, 3.95, 4.05}, INTERP_MAG_PHASE, true);
+  const std::vector<double> close{0, 1, 2, 2.05, 3, 4};
+  const std::vector<TsComplex> v{{1, 0}, {2, 0}, {3, 1}, {4, 2}, {5, 3}, {6, 4}};
+  const Result r = Resample(close, v, {1.05, 2.02, 2.05, 3.95, 4.05}, INTERP_MAG_PHASE, true);
   EXPECT_EQ(r.status, INTERP_UNCHANGED);
   EXPECT_FALSE(r.interpolated);
-  EXPECT_EQ(r.out, (std::vector<TsComplex>{d[1], d[2], d[2], d[5], d[5]}));
+  EXPECT_EQ(r.out, (std::vector<TsComplex>{v[1], v[2], v[2], v[5], v[5]}));
 }
 
 TEST(CircularInterpolation, EvenlySpacedCircleStaysOnTheCircle) {
@@ -245,7 +242,7 @@ TEST(CircularInterpolation, OldStimulusOrderDoesNotChangeTheResult) {
   }
 }
 
-TEST(CircularInterpolation, FewOldPointsInterpolateMagPhaseOrCopy) {
+TEST(CircularInterpolation, FewOldOrNoNewPointsInterpolateMagPhaseCopyOrReturn) {
   const std::vector<TsComplex> two{{1, 0}, {0, 2}};
   const std::vector<double> newX{5, 12.5, 20, 25};
   Result r = Resample({10, 20}, two, newX, INTERP_CIRCULAR, true);
@@ -265,9 +262,8 @@ TEST(CircularInterpolation, FewOldPointsInterpolateMagPhaseOrCopy) {
   r = Resample({}, {}, {1, 2}, INTERP_CIRCULAR, true);
   EXPECT_EQ(r.status, INTERP_OUT_OF_RANGE);
   EXPECT_EQ(r.out, std::vector<TsComplex>(2, kUnwritten));
-}
 
-TEST(CircularInterpolation, EmptyNewStimulusIsAnsweredWithoutReadingIt) {
+  // An empty new stimulus is answered without reading it.
   bool flag = true;
   EXPECT_EQ(CircularInterpolation(3, nullptr, nullptr, 0, nullptr, nullptr, &flag, INTERP_CIRCULAR),
             INTERP_UNCHANGED);

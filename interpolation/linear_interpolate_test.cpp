@@ -101,16 +101,13 @@ TEST(FindNearestIndex, CrossesSegmentsAndTheGapsBetweenThem) {
   EXPECT_EQ(FindNearestIndex(InputArray(std::vector<double>{1, 2, 2, 3}), 0.0, 2.0), 2.0);
 }
 
-TEST(FindNearestIndex, NearerEndWinsOutsideWithTheLastOnATie) {
+TEST(FindNearestIndex, PicksTheNearestCrossingOrTheNearerEndWithTheLastOnATie) {
   // 0 .. 10 .. 0: both ends are 0, so any value outside is equally far from both.
-  InputArray stimulus(std::vector<double>{0, 10, 0});
-  EXPECT_EQ(FindNearestIndex(stimulus, 0.0, -1.0), 2.0);
-  EXPECT_EQ(FindNearestIndex(stimulus, 0.0, 11.0), 2.0);
-  InputArray rising(std::vector<double>{0, 10});
-  EXPECT_EQ(FindNearestIndex(rising, 1.0, -1.0), 0.0);
-}
+  const InputArray tent(std::vector<double>{0, 10, 0});
+  EXPECT_EQ(FindNearestIndex(tent, 0.0, -1.0), 2.0);
+  EXPECT_EQ(FindNearestIndex(tent, 0.0, 11.0), 2.0);
+  EXPECT_EQ(FindNearestIndex(InputArray(std::vector<double>{0, 10}), 1.0, -1.0), 0.0);
 
-TEST(FindNearestIndex, PicksTheCrossingNearestTheGivenIndex) {
   // Rises over 0 .. 10 and falls over 11 .. 21: the value 5 is crossed at 5 and at 16.
   InputArray stimulus(0.0, 10.0, 11, Linear);
   stimulus.push_back(Segment(10.0, 0.0, 11, Linear));

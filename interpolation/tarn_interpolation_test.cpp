@@ -72,7 +72,7 @@ TEST(TarnInterpolation, LinearGridsInsideBeforeAndBeyondTheData) {
   EXPECT_EQ(result, (std::vector<TsComplex>{{-10, 1}, {0, 0}, {20, -2}, {7, 7}}));
 }
 
-TEST(TarnInterpolation, LinearGridPointsUseTheIntervalTheyLieIn) {
+TEST(TarnInterpolation, LinearGridPointsUseTheirIntervalUpToTheStopInEitherDirection) {
   // Grid steps that do not divide the stimulus spacing, finer and coarser than it: every
   // grid point inside the data matches plain linear interpolation.
   std::mt19937 rng(7);
@@ -88,17 +88,13 @@ TEST(TarnInterpolation, LinearGridPointsUseTheIntervalTheyLieIn) {
       EXPECT_NEAR(out[k], ReferenceLinear(y, x, g), 2e-5) << points << " points, k=" << k;
     }
   }
-}
 
-TEST(TarnInterpolation, LinearStimulusRoundedToFloatStillReachesTheGridStop) {
   // 9 GHz is not a float: the stored stimulus ends 512 Hz short of the grid stop.
-  const std::vector<float> x{8.0e9f, 8.5e9f, 9.0e9f}, y{1, 2, 3};
-  const std::vector<float> out = Linear(y, x, 8.0e9, 9.0e9, 201);
+  const std::vector<float> out = Linear({1, 2, 3}, {8.0e9f, 8.5e9f, 9.0e9f}, 8.0e9, 9.0e9, 201);
   EXPECT_NEAR(out.back(), 3.0f, 1e-5);
   EXPECT_NEAR(out[100], 2.0f, 1e-5);
-}
 
-TEST(TarnInterpolation, LinearDescendingStimulusOrGridMirrorsAscending) {
+  // A descending stimulus or grid mirrors the ascending one.
   const std::vector<float> x{0, 1, 2, 3}, y{1, 4, 2, 8};
   const std::vector<float> ascending = Linear(y, x, -0.5, 3.25, 16);
   std::vector<float> rx(x.rbegin(), x.rend()), ry(y.rbegin(), y.rend());
@@ -108,7 +104,7 @@ TEST(TarnInterpolation, LinearDescendingStimulusOrGridMirrorsAscending) {
   for (int k = 0; k < 16; ++k) EXPECT_NEAR(reversed[k], ascending[k], 1e-5) << k;
 }
 
-TEST(TarnInterpolation, LinearDegenerateCallsHaveFixedOutcomes) {
+TEST(TarnInterpolation, LinearDegenerateCallsAndNaNSamplesHaveFixedOutcomes) {
   const std::vector<float> x{0, 1, 2}, y{0, 10, 20};
   EXPECT_EQ(Linear(y, x, 0.5, 99, 1), std::vector<float>{5});     // one point: start
   EXPECT_EQ(Linear(y, x, 3.5, 99, 1), std::vector<float>{-999});  // beyond the data
@@ -132,9 +128,8 @@ TEST(TarnInterpolation, LinearDegenerateCallsHaveFixedOutcomes) {
   TarnInterpolation(data.data(), stim.data(), 2, resampled.data(), factor.data(), result.data(), 0,
                     1, 2, 4);
   EXPECT_EQ(result, (std::vector<TsComplex>{{1, 1}, {2, 2}, {-5, -5}, {-5, -5}}));
-}
 
-TEST(TarnInterpolation, LinearNaNSampleSpoilsOnlyItsIntervals) {
+  // A NaN sample spoils only its own intervals.
   const std::vector<float> out = Linear({0, 1, kNaN, 3, 4, 5}, Range(6, 0, 1), 0, 5, 11);
   for (int k = 0; k < 11; ++k) {
     const bool touches_nan = k >= 3 && k <= 6;  // grid 1.5 .. 3.0 lies in (1, 3]
@@ -205,17 +200,14 @@ TEST(TarnCubicInterpolation, ReproducesLinesPassesThroughSamplesAndFollowsCurves
   for (int k = 0; k < 1001; ++k) EXPECT_NEAR(out[k], std::cos(k * 1e6 / 1.5e8), 2e-3) << k;
 }
 
-TEST(TarnCubicInterpolation, HoldsTheEndSamplesOutsideTheStimulus) {
+TEST(TarnCubicInterpolation, HoldsEndSamplesOutsideTheStimulusAndDegenerateCallsHaveFixedOutcomes) {
   const std::vector<double> x{1, 2, 3};
   EXPECT_EQ(Cubic({5, 6, 9}, x, -1, 5, 7), (std::vector<float>{5, 5, 5, 6, 9, 9, 9}));
   // Descending stimulus and descending grid mirror the ascending case.
   EXPECT_EQ(Cubic({9, 6, 5}, {3, 2, 1}, -1, 5, 7), (std::vector<float>{5, 5, 5, 6, 9, 9, 9}));
   EXPECT_EQ(Cubic({5, 6, 9}, x, 5, -1, 7), (std::vector<float>{9, 9, 9, 6, 5, 5, 5}));
-}
 
-TEST(TarnCubicInterpolation, DegenerateCallsHaveFixedOutcomes) {
-  const std::vector<double> x{0, 1, 1, 2};  // a repeated stimulus value
-  const std::vector<float> out = Cubic({0, 1, 1, 2}, x, 0, 2, 9);
+  const std::vector<float> out = Cubic({0, 1, 1, 2}, {0, 1, 1, 2}, 0, 2, 9);  // a repeat
   for (int k = 0; k < 9; ++k) EXPECT_TRUE(std::isfinite(out[k])) << k;
   EXPECT_EQ(Cubic({4}, {1}, 0, 2, 3), (std::vector<float>{4, 4, 4}));
   EXPECT_EQ(Cubic({1, 3}, {0, 1}, 0.25, 99, 1), std::vector<float>{1.5f});

@@ -41,7 +41,7 @@ TEST(Segment, ConstructionNormalisesTypeAndCountAndExtremesFollowThePoints) {
   EXPECT_TRUE(std::isnan(Segment(std::vector<double>{}).min_element()));
 }
 
-TEST(Segment, LinearPointsHitBothEndsAndLogPointsMirrorWhenDescending) {
+TEST(Segment, PointsHitBothEndsMirrorWhenDescendingAndBadAccessThrows) {
   const Segment s(0.1, 0.7, 7, Linear);
   EXPECT_EQ(s.at(0), 0.1);
   EXPECT_EQ(s.at(6), 0.7);
@@ -51,9 +51,17 @@ TEST(Segment, LinearPointsHitBothEndsAndLogPointsMirrorWhenDescending) {
   for (unsigned int i = 0; i < 7; ++i) EXPECT_EQ(points[i], s.at(i)) << i;
   EXPECT_EQ(Segment(10, 1, 3, Log).GetArray(), (std::vector<double>{10, 3.1622776601683795, 1}));
   EXPECT_EQ(Segment(1, 10, 3, Log).GetArray(), (std::vector<double>{1, 3.1622776601683795, 10}));
+  EXPECT_EQ(CaughtLumen([] { Segment(0, 10, 11, Linear).at(11); }),
+            std::make_pair(E_FAIL, std::wstring(L"index")));
+  EXPECT_EQ(CaughtLumen([] { Segment(1, 10, 3, Log).at(3); }),
+            std::make_pair(E_FAIL, std::wstring(L"index")));
+  EXPECT_EQ(CaughtLumen([] { Segment().back(); }),
+            std::make_pair(E_FAIL, std::wstring(L"Segment::back()")));
+  EXPECT_EQ(Segment(4.0, 2).at(1000), 4.0);  // a constant answers any index
+  EXPECT_THROW(Segment(std::vector<double>{1, 2}).at(2), std::out_of_range);
 }
 
-TEST(Segment, ComputeLogPointRules) {
+TEST(Segment, ComputeLogPointRulesAndSweepsStayInsideAndRejectBadInputUnwritten) {
   EXPECT_DOUBLE_EQ(ComputeLogPoint(1, 1000, 4, 2), 100);
   EXPECT_EQ(ComputeLogPoint(5, 5, 3, 1), 5);
   EXPECT_EQ(ComputeLogPoint(7, 9, 1, 5), 7);  // one point: start, whatever the index
@@ -67,9 +75,7 @@ TEST(Segment, ComputeLogPointRules) {
   };
   EXPECT_EQ(what(0, 0), "numPts");
   EXPECT_EQ(what(3, 3), "index");
-}
 
-TEST(Segment, ComputeLogPointsStaysInsideTheSweepAndRejectsBadInputUnwritten) {
   std::vector<double> out;
   ComputeLogPoints(10e6, 20e9, 1001, out);
   ASSERT_EQ(out.size(), 1001u);
@@ -84,17 +90,6 @@ TEST(Segment, ComputeLogPointsStaysInsideTheSweepAndRejectsBadInputUnwritten) {
   std::vector<double> kept = {42};
   EXPECT_THROW(ComputeLogPoints(1, 10, -1, kept), std::invalid_argument);
   EXPECT_EQ(kept, std::vector<double>{42});
-}
-
-TEST(Segment, AccessErrorsCarryCodeAndMessage) {
-  EXPECT_EQ(CaughtLumen([] { Segment(0, 10, 11, Linear).at(11); }),
-            std::make_pair(E_FAIL, std::wstring(L"index")));
-  EXPECT_EQ(CaughtLumen([] { Segment(1, 10, 3, Log).at(3); }),
-            std::make_pair(E_FAIL, std::wstring(L"index")));
-  EXPECT_EQ(CaughtLumen([] { Segment().back(); }),
-            std::make_pair(E_FAIL, std::wstring(L"Segment::back()")));
-  EXPECT_EQ(Segment(4.0, 2).at(1000), 4.0);  // a constant answers any index
-  EXPECT_THROW(Segment(std::vector<double>{1, 2}).at(2), std::out_of_range);
 }
 
 TEST(Segment, FindOnLinearReturnsExactIndicesAndNeverPassesTheEnd) {
@@ -113,7 +108,7 @@ TEST(Segment, FindOnLinearReturnsExactIndicesAndNeverPassesTheEnd) {
   }
 }
 
-TEST(Segment, FindOnLogFixedAndArbitrary) {
+TEST(Segment, FindOnLogFixedAndArbitraryAndEqualityByPoints) {
   const Segment log(1, 1000, 4, Log);
   EXPECT_NEAR(log.Find(100, false), 2.0, 1e-12);
   EXPECT_LE(log.Find(1000, false), 3.0);
@@ -124,9 +119,8 @@ TEST(Segment, FindOnLogFixedAndArbitrary) {
   EXPECT_EQ(zigzag.Find(0.5, false), 2.5);  // the highest crossing wins
   EXPECT_EQ(zigzag.Find(0.5, true), 0.5);   // the lowest crossing wins
   EXPECT_EQ(Segment().Find(0, false), -1.0);
-}
 
-TEST(Segment, EqualityComparesPointSequences) {
+  // Equality compares point sequences.
   EXPECT_EQ(Segment(3.0, 4), Segment(3, 3, 4, Linear));
   EXPECT_NE(Segment(3.0, 4), Segment(2, 2, 4, Linear));
   EXPECT_EQ(Segment(1, 10, 2, Log), Segment(1, 10, 2, Linear));

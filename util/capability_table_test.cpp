@@ -14,7 +14,7 @@ namespace {
 
 using Indices = std::vector<int>;
 
-TEST(CapabilityTable, LookupInEmptyTableGrowsOnlyOuterLevel) {
+TEST(CapabilityTable, LookupGrowsOnlyOuterLevelOfEmptyTableAndInnerLevelOfExistingRow) {
   CapabilityTable table;
   EXPECT_EQ(table.Get(4, 2, 7), 0);
   EXPECT_EQ(table.OuterSize(), 5u);
@@ -23,10 +23,8 @@ TEST(CapabilityTable, LookupInEmptyTableGrowsOnlyOuterLevel) {
   // A smaller i never shrinks the table.
   EXPECT_EQ(table.Get(1, 0, 0), 0);
   EXPECT_EQ(table.OuterSize(), 5u);
-}
 
-TEST(CapabilityTable, LookupGrowsInnerLevelOnlyOfExistingRow) {
-  CapabilityTable table;
+  table = CapabilityTable();
   table.Set(1, 2, 3, 77);
   EXPECT_EQ(table.MiddleSize(1), 3u);
   EXPECT_EQ(table.InnerSize(1, 2), 4u);
@@ -95,7 +93,7 @@ TEST(CapabilityTable, MissingOrNegativeIndicesChangeNothing) {
   EXPECT_EQ(table.Get(1, 1, 1), 5);
 }
 
-TEST(CapabilityTable, SetOverwritesAndClearZeroesOneEntry) {
+TEST(CapabilityTable, SetOverwritesClearZeroesOneEntryAndAddressesKeepFullWidth) {
   CapabilityTable table;
   table.Set(0, 1, 2, 39);
   table.Set(0, 1, 2, 40);
@@ -105,10 +103,8 @@ TEST(CapabilityTable, SetOverwritesAndClearZeroesOneEntry) {
   EXPECT_EQ(table.Get(0, 1, 2), 0);
   EXPECT_EQ(table.Get(0, 1, 0), 41);
   EXPECT_EQ(table.InnerSize(0, 1), 3u);
-}
 
-TEST(CapabilityTable, KeepsFullWidthAddresses) {
-  CapabilityTable table;
+  table = CapabilityTable();
   const std::intptr_t high = static_cast<std::intptr_t>(0x7FFF'1234'5678'9ABCLL);
   table.Set(3, 0, 0, high);
   table.Set(3, 1, 0, high + 1);
