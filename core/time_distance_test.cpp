@@ -9,7 +9,7 @@ namespace {
 
 using Setup = Interface::ITimeDomainMarkerSetup;
 
-TEST(TimeDistance, ReflectionHalvesThePathAndUnitsConvert) {
+TEST(TimeDistance, ReflectionHalvesThePathUnitsConvertAndDistance2TimeInverts) {
   EXPECT_NEAR(Time2Distance(1e-9, 1, Setup::DISTANCE_REFLECTION, Setup::DISTANCE_METERS),
               0.149896229, 1e-12);
   EXPECT_NEAR(Time2Distance(1e-9, 1, Setup::DISTANCE_TRANSMISSION, Setup::DISTANCE_METERS),
@@ -22,9 +22,8 @@ TEST(TimeDistance, ReflectionHalvesThePathAndUnitsConvert) {
   EXPECT_EQ(Time2Distance(2e-9, 1, Setup::DISTANCE_TRANSMISSION,
                           static_cast<Setup::DistanceMarkerUnit>(7)),
             Time2Distance(2e-9, 1, Setup::DISTANCE_TRANSMISSION, Setup::DISTANCE_METERS));
-}
 
-TEST(TimeDistance, Distance2TimeInvertsEveryModeAndUnit) {
+  // Distance2Time inverts every mode and unit.
   for (auto mode : {Setup::DISTANCE_TRANSMISSION, Setup::DISTANCE_REFLECTION}) {
     for (auto unit : {Setup::DISTANCE_METERS, Setup::DISTANCE_FEET, Setup::DISTANCE_INCHES,
                       static_cast<Setup::DistanceMarkerUnit>(-1)}) {

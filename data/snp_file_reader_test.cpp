@@ -206,7 +206,7 @@ TEST_F(SnPReaderTest, NoiseDataAfterTheMarkerBecomesThreeCustomTraces) {
   EXPECT_EQ(same.GetNumCustomParams(), 0);
 }
 
-TEST_F(SnPReaderTest, CommentsBlankLinesAndLineEndingsAnywhere) {
+TEST_F(SnPReaderTest, CommentsBlankLinesLineEndingsAndByteOrderMarks) {
   const std::string text =
       "! a\r\n\r\n[Version] 2.0 ! version\r\n! b\r\n  # GHz S MA R 50 ! options\r\n"
       "[Number of Ports] 2\r\n! c\r\n[Two-Port Data Order] 12_21\r\n[Reference] 50\r\n 50\r\n"
@@ -217,9 +217,8 @@ TEST_F(SnPReaderTest, CommentsBlankLinesAndLineEndingsAnywhere) {
   ExpectPolar(Value(2, 1), 0.1, 90);
   ExpectPolar(Value(2, 2, 1), 0.5, 40);
   EXPECT_EQ(reader->GetFileInfo().portReferences, (std::vector<double>{50, 50}));
-}
 
-TEST_F(SnPReaderTest, ByteOrderMarks) {
+  // A UTF-8 byte-order mark is skipped; a broken one or a UTF-16 one is refused.
   EXPECT_EQ(Read("\xEF\xBB\xBF" + std::string(kV1TwoPort)), 2);
   EXPECT_EQ(Read("\xEF\xBB" + std::string(kV1TwoPort)), -1);
   EXPECT_EQ(Read("\xFF\xFE" + std::string(kV1TwoPort)), -1);

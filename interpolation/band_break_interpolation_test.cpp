@@ -71,7 +71,7 @@ TEST_F(BandBreaks, TwoPointBandTakesThePointBeforeItAsThirdPoint) {
   EXPECT_EQ(Resample({0.5}, {1.5})[0], LinearInterpolateUsingMagPhase(0, 1, m_d[0], m_d[1], 0.5));
 }
 
-TEST_F(BandBreaks, BandWithoutOldPointsBorrowsTheNextTwo) {
+TEST_F(BandBreaks, EmptyBandsBorrowNeighboursAndOneOldPointIsCopied) {
   // No old point lies in (3.2, 3.8]: the run takes old points 4 and 5 (and 3 before them) and
   // extrapolates back along their circle.
   EXPECT_LT((Resample({3.5}, {3.2, 3.8})[0] - OnCircle(3.5)).Mag(), 1e-5);
@@ -79,9 +79,8 @@ TEST_F(BandBreaks, BandWithoutOldPointsBorrowsTheNextTwo) {
   const std::vector<TsComplex> top = Resample({9.5, 12}, {9.2});
   EXPECT_LT((top[0] - OnCircle(9.5)).Mag(), 1e-5);
   EXPECT_LT((top[1] - OnCircle(12)).Mag(), 1e-5);
-}
 
-TEST_F(BandBreaks, OneOldPointGivesItsValueEverywhere) {
+  // One old point gives its value everywhere.
   std::vector<TsComplex> out(3);
   bool flag = false;
   EXPECT_EQ(CircularInterpolationUsingBandBreaks(InputArray(4.0, 1), m_d.data(),

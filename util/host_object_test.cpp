@@ -41,7 +41,7 @@ class Probe final : public IOtherProbe, public IProbe {
   int m_answer;
 };
 
-TEST(CapabilitiesAccessor, IsOneProcessWideObjectOverSharedState) {
+TEST(CapabilitiesAccessor, IsOneProcessWideObjectWhereTypesRegisterOnceInOrder) {
   ICapabilitiesAccessor* accessor = CreateCapabilitiesAccessor();
   EXPECT_EQ(CreateCapabilitiesAccessor(), accessor);
 
@@ -50,15 +50,12 @@ TEST(CapabilitiesAccessor, IsOneProcessWideObjectOverSharedState) {
   EXPECT_EQ(accessor->GetCapability(40, 1, 2), 99);
   EXPECT_EQ(accessor->ClearCapability(40, 1, 2), 2);
   EXPECT_EQ(second.GetCapability(40, 1, 2), 0);
-}
 
-TEST(CapabilitiesAccessor, TypesRegisterOnceInOrder) {
+  // Types register once, in order.
   struct FirstType {};
   struct SecondType {};
-  ICapabilitiesAccessor* accessor = CreateCapabilitiesAccessor();
   const int first = accessor->RegisterType(typeid(FirstType*));
-  const int second = accessor->RegisterType(typeid(SecondType*));
-  EXPECT_EQ(second, first + 1);
+  EXPECT_EQ(accessor->RegisterType(typeid(SecondType*)), first + 1);
   EXPECT_EQ(accessor->RegisterType(typeid(FirstType*)), first);
   EXPECT_NE(accessor->RegisterType(typeid(FirstType)), first);  // pointer type is the key
 }
