@@ -22,10 +22,7 @@ double Distance(TsComplex a, TsComplex b) {
 // Points on the circle about `centre` with `radius`, turning `step` radians per point.
 std::vector<TsComplex> OnCircle(int n, TsComplex centre, double radius, double step) {
   std::vector<TsComplex> v(n);
-  for (int k = 0; k < n; ++k) {
-    v[k] = TsComplex(centre.re + radius * std::cos(0.3 + step * k),
-                     centre.im + radius * std::sin(0.3 + step * k));
-  }
+  for (int k = 0; k < n; ++k) v[k] = centre + TsComplex::FromMagPhase(radius, 0.3 + step * k);
   return v;
 }
 
