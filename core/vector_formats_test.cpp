@@ -74,7 +74,7 @@ TEST(VectorFormats, SquareInvertAndProductAgree) {
   }
 }
 
-TEST(VectorFormats, UnwrappedPhaseDescendsThroughMinusPi) {
+TEST(VectorFormats, UnwrappedPhaseCrossesMinusPiAndFollowsARandomWalkWholeOrInPieces) {
   // With the TsComplex::Phase rule for a zero real part.
   std::vector<float> phase(3);
   const std::vector<TsComplex> down = {TsComplex(0, -1), TsComplex(-1, 0.01), TsComplex(0, 0)};
@@ -129,10 +129,7 @@ TEST(VectorFormats, SqrtKeepsTheBranchContinuous) {
   EXPECT_NEAR(v[2].Sqrt().Phase(), -0.1 * kPi, 1e-6);  // the principal root jumps
   Sqrt(v);
   const double expected[] = {0.0, 0.45 * kPi, 0.9 * kPi};
-  for (int i = 0; i < 3; ++i) {
-    EXPECT_NEAR(v[i].Phase(), expected[i], 1e-6) << i;
-    EXPECT_NEAR(v[i].Mag(), 1.0, 1e-6) << i;
-  }
+  for (int i = 0; i < 3; ++i) EXPECT_LT((v[i] - Unit(expected[i])).Mag(), 1e-6) << i;
 
   // Property: over a winding trace the roots square back to the data, and neighbours stay
   // within a quarter turn (half of the data's step of at most 0.95 pi, plus rounding).
@@ -144,12 +141,8 @@ TEST(VectorFormats, SqrtKeepsTheBranchContinuous) {
   std::vector<TsComplex> roots = data;
   Sqrt(roots);
   for (size_t i = 0; i < roots.size(); ++i) {
-    const TsComplex back = roots[i] * roots[i];
-    ASSERT_NEAR(back.re, data[i].re, 1e-5) << i;
-    ASSERT_NEAR(back.im, data[i].im, 1e-5) << i;
-    if (i > 0) {
-      ASSERT_LE(std::abs((roots[i] / roots[i - 1]).Phase()), 0.4876 * kPi) << i;
-    }
+    ASSERT_LT((roots[i] * roots[i] - data[i]).Mag(), 1.5e-5) << i;
+    if (i > 0) ASSERT_LE(std::abs((roots[i] / roots[i - 1]).Phase()), 0.4876 * kPi) << i;
   }
 
   std::vector<TsComplex> empty, negative = {TsComplex(-4, 0)};
@@ -158,15 +151,14 @@ TEST(VectorFormats, SqrtKeepsTheBranchContinuous) {
   EXPECT_LT((negative[0] - TsComplex(0, 2)).Mag(), 1e-6);
 }
 
-TEST(VectorFormats, SqrtExRecoversTheRootOfADelayLineAndLeavesDegenerateInputsAsSqrtDoes) {
+TEST(VectorFormats, SqrtExRecoversADelayLineRootAndLeavesDegenerateInputsAsSqrtDoes) {
   // Root r(f) = a(f) e^{j(phase0 - 2 pi f tau)}; the data is r^2. Whatever the first point's
   // principal root, the sign decision must give back r itself.
   const double tau = 1e-9;  // s
   for (double phase0 : {0.0, 0.3, -2.0, 3.0}) {
     for (double start : {0.0, 0.1e9, 0.3e9, 0.6e9, 1.9e9, 7.77e9}) {
       const int n = 201;
-      const double stop = start + 2e9;
-      const InputArray stimulus(start, stop, n, Linear);
+      const InputArray stimulus(start, start + 2e9, n, Linear);
       std::vector<TsComplex> root(n), data(n);
       for (int i = 0; i < n; ++i) {
         const double f = stimulus[i];
@@ -175,8 +167,7 @@ TEST(VectorFormats, SqrtExRecoversTheRootOfADelayLineAndLeavesDegenerateInputsAs
       }
       SqrtEx(stimulus, static_cast<float>(phase0), data);
       for (int i = 0; i < n; i += 50) {
-        EXPECT_NEAR(data[i].re, root[i].re, 1e-5) << phase0 << " " << start << " " << i;
-        EXPECT_NEAR(data[i].im, root[i].im, 1e-5) << phase0 << " " << start << " " << i;
+        EXPECT_LT((data[i] - root[i]).Mag(), 1.5e-5) << phase0 << " " << start << " " << i;
       }
     }
   }
