@@ -129,9 +129,12 @@ int CSnPFileBase::ReadSNPText(std::string_view text) {
     CSNParameter trace(stimulus);
     trace.SetStimulus(stimulus);
     std::vector<LumenUtility::TsComplex>& data = trace.GetData();
-    const float* value = content.values.data() + 2 * source;
-    for (std::size_t i = 0; i < points; ++i, value += 2 * pairs) {
-      data[i] = CSNParameter::FromPair(value[0], value[1], content.info.form);
+    // Indexed rather than walked by pointer: with no points the value array is empty, and
+    // even forming data() + offset on it is undefined.
+    for (std::size_t i = 0; i < points; ++i) {
+      const std::size_t at = 2 * (source + i * pairs);
+      data[i] =
+          CSNParameter::FromPair(content.values[at], content.values[at + 1], content.info.form);
     }
     // Named after the matrix position the trace lands in (for a two-port file in 11, 21,
     // 12, 22 order the second pair read is S21).

@@ -296,6 +296,15 @@ TEST_F(SnPReaderTest, FailedReadLeavesTheEarlierTracesAndVersionTwoReplacesThePo
   EXPECT_EQ(reader->ReadSNPText(""), -1);
 }
 
+TEST(SnPReaderEdge, OptionLineWithoutDataGivesEmptyTraces) {
+  // Filling traces from an empty value array must not touch it.
+  CSnPFileBase reader(2);
+  EXPECT_EQ(reader.ReadSNPText("# GHz S RI R 50\n"), 0);
+  for (int k = 0; k < 4; ++k) {
+    EXPECT_EQ(reader.GetParam(static_cast<ESNParam>(k)).GetNumPoints(), 0);
+  }
+}
+
 TEST(SnPFileName, PortCountComesFromTheExtension) {
   EXPECT_EQ(SnPPortCountFromFileName(L"dir.s4p/filter.S2P"), 2);
   EXPECT_EQ(SnPPortCountFromFileName(L"a.s12p"), 12);
