@@ -47,6 +47,28 @@ double Prefix(std::string_view rest, std::size_t& length) {
   }
 }
 
+// The multiplier of a prefix from kilo up in front of a written-out "Hz", read without case;
+// 0 for any other prefix, which then keeps its SI meaning.
+double FrequencyPrefix(std::string_view prefix) {
+  if (prefix.size() != 1) return 0;  // the micro sign
+  switch (prefix.front()) {
+    case 'k':
+    case 'K':
+      return 1e3;
+    case 'm':
+    case 'M':
+      return 1e6;
+    case 'g':
+    case 'G':
+      return 1e9;
+    case 't':
+    case 'T':
+      return 1e12;
+    default:
+      return 0;
+  }
+}
+
 }  // namespace
 
 std::optional<double> ParseEngineeringValue(std::string_view text, std::string_view unit) {
@@ -60,10 +82,18 @@ std::optional<double> ParseEngineeringValue(std::string_view text, std::string_v
   while (!rest.empty() && rest.front() == ' ') rest.remove_prefix(1);
   if (rest.empty() || EqualsIgnoringCase(rest, unit)) return value;
   std::size_t length = 0;
-  const double multiplier = Prefix(rest, length);
-  if (multiplier == 0) return std::nullopt;
+  double multiplier = Prefix(rest, length);
+  const std::string_view prefix = rest.substr(0, length);
   rest.remove_prefix(length);
   if (!rest.empty() && !EqualsIgnoringCase(rest, unit)) return std::nullopt;
+  // Frequencies written with their unit ("800mhz", "2.4 ghz") are read without regard to
+  // the prefix's case: nobody sweeps in millihertz, and typing the unit shows that the
+  // letter was meant as a prefix of it. A bare prefix keeps SI case ("1.5m" is milli).
+  if (!rest.empty() && EqualsIgnoringCase(unit, "Hz")) {
+    const double frequencyMultiplier = FrequencyPrefix(prefix);
+    if (frequencyMultiplier != 0) multiplier = frequencyMultiplier;
+  }
+  if (multiplier == 0) return std::nullopt;
   // The prefix joins the decimal exponent and the text is read again, so "5u" is exactly
   // the double nearest 5e-6, which 5 * 1e-6 is not.
   const std::string_view number(text.data(), static_cast<std::size_t>(r.ptr - text.data()));

@@ -8,8 +8,9 @@ namespace lumenutil {
 
 // A decimal number, optionally followed by one SI prefix (p n u m k M G T; "u" and the micro
 // sign both mean 1e-6) and optionally by the unit `unit`, compared without case ("Hz",
-// "s"...); blanks may separate the number from the rest. Nothing for anything else, for
-// "inf" or "nan", and for values beyond the double range.
+// "s"...); blanks may separate the number from the rest. In front of a written-out "Hz" the
+// prefixes from kilo up are read without case ("800mhz" is 800 MHz). Nothing for anything
+// else, for "inf" or "nan", and for values beyond the double range.
 std::optional<double> ParseEngineeringValue(std::string_view text, std::string_view unit);
 
 }  // namespace lumenutil
