@@ -5,3 +5,5 @@
 #include "lumen/platform/error_codes.h"
 #include "lumen/platform/lumen_exception.h"
 #include "lumen/platform/text_conversion.h"
+#include "lumen/platform/archive.h"
+#include "lumen/platform/file.h"
