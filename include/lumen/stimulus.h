@@ -3,3 +3,4 @@
 
 #include "lumen/stimulus/input_array.h"
 #include "lumen/stimulus/segment.h"
+#include "lumen/stimulus/archive.h"

@@ -17,7 +17,11 @@
 #include "lumen/export.h"
 #include "lumen/stimulus/segment.h"
 
+class CArchive;
+
 namespace LumenUtility {
+
+class Archive;
 
 class LUMEN_API InputArray {
  public:
@@ -157,6 +161,29 @@ class LUMEN_API InputArray {
   void OptimizeRepresentationOnlyFixed();
   InputArray ExtractInputArray(const std::vector<int>& indices) const;
 
+  // Persisted forms. Every recall checks the record against the bytes there are, rejects
+  // counts the bytes cannot hold before allocating, requires the total point count to be the
+  // sum of the segments' counts, and leaves the array as it was when it throws. Errors are
+  // LumenException 0xE8080882 naming the record unless said otherwise.
+  //
+  // Archive form. Storing: version 1, the segment count, each segment's record. Loading:
+  // throws "InputArray version not recognized" for a version other than 1, and the errors of
+  // Segment::Serialize.
+  void Serialize(Archive& ar);
+  // The packed record: 20 bytes plus each segment's packed record. Null `buffer` returns the
+  // record size; a `bufferSize` (bytes) below it returns 0 and writes nothing; else writes
+  // the record and returns its size.
+  int SaveData(unsigned char* buffer, int bufferSize) const;
+  // Reads the packed record at `buffer` (`bufferSize` bytes readable) and returns its record
+  // size. A version below 1 changes nothing; a total point count of 0 leaves no segments.
+  // Throws for a buffer shorter than the header or the record, a segment byte count or
+  // segment count the record cannot hold, and the errors of Segment::RecallData.
+  int RecallData(const unsigned char* buffer, int bufferSize);
+  // MFC form, written or read by ar.IsStoring(). Loading throws LumenException 0xE8080867
+  // (no message) for an array or segment version above 1; the CArchiveException of a short
+  // archive passes through.
+  void Serialize(CArchive& ar);
+
  private:
   std::vector<Segment>& MutableSegments();
   // Replaces the array by its runs (linear or constant) when that takes fewer segments or
@@ -173,6 +200,10 @@ class LUMEN_API InputArray {
 // Gives every array the same segment boundaries. Throws LumenException(E_FAIL) when the
 // arrays do not all hold the same number of points.
 LUMEN_API void ConformSegments(std::vector<InputArray>& arrays);
+
+// Both call a.Serialize(ar): the archive's own mode decides the direction.
+LUMEN_API void operator<<(CArchive& ar, InputArray& a);
+LUMEN_API void operator>>(CArchive& ar, InputArray& a);
 
 // Text form: "(" segments separated by line feeds ")", 15 significant digits.
 LUMEN_API std::wostream& operator<<(std::wostream& os, const InputArray& a);

@@ -20,6 +20,7 @@ namespace LumenUtility {
 
 enum SegmentType : int { Linear = 0, Log = 1, Fixed = 2, Arbitrary = 3 };
 
+class Archive;
 class InputArray;
 
 class LUMEN_API Segment {
@@ -74,6 +75,27 @@ class LUMEN_API Segment {
   // Equality of the point sequences, exact.
   bool operator==(const Segment& other) const;
   bool operator!=(const Segment& other) const { return !(*this == other); }
+
+  // Persisted forms. Every recall checks the record against the bytes there are before it
+  // trusts a count, and leaves the segment as it was when it throws.
+  //
+  // Storing: writes the archive-form record (version 1, start, stop, count, type, and for
+  // Arbitrary the byte count and the points). Loading: reads one; throws LumenException
+  // 0xE8080882 "InputArray::Segment serialization failed." for a version other than 1, and
+  // with code 0xE8080882 for a type outside 0 to 3, a byte count other than 8 x the point
+  // count, or too few bytes (the archive's message, then one naming this record).
+  void Serialize(Archive& ar);
+  // The packed record: 32 bytes, plus 8 per point for Arbitrary. A null `buffer` returns the
+  // record size; a `bufferSize` (bytes) below it returns 0 and writes nothing; else writes
+  // the record and returns its size. Throws LumenException 0xE8080882 for a record larger
+  // than 2^31 - 1 bytes.
+  int SaveData(unsigned char* buffer, int bufferSize) const;
+  // Reads the packed record at `buffer` (`bufferSize` bytes readable) and returns its record
+  // size. Versions above 1 are read as 1. Throws LumenException 0xE8080882 "Unhandled recall
+  // version in InputArray Segment" for version 0 or below, and with the same code and a
+  // message naming the record when the buffer is shorter than the record or its header, the
+  // record size does not fit the points, or the type is outside 0 to 3.
+  int RecallData(const unsigned char* buffer, int bufferSize);
 
   Segment& operator+=(double x);  // Log of more than 2 points becomes Arbitrary
   Segment& operator*=(double x);
