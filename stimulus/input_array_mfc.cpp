@@ -72,7 +72,6 @@ void InputArray::Serialize(CArchive& ar) {
   const std::int32_t count = ReadInt(ar);
   if (count < 0) packed::Reject(kMfcRecord, L"segment count " + std::to_wstring(count));
   std::vector<Segment> segments;
-  std::uint64_t sum = 0;
   for (std::int32_t k = 0; k < count; ++k) {
     CheckVersion(ar);
     Segment s;
@@ -96,16 +95,10 @@ void InputArray::Serialize(CArchive& ar) {
       s.m_pCache = points;
       s.m_offset = static_cast<unsigned int>(offset);
     }
-    sum += s.m_numPoints;
     segments.push_back(s);
   }
-  if (sum != total) {
-    packed::Reject(kMfcRecord, L"total point count " + std::to_wstring(total) +
-                                   L" is not the segments' " + std::to_wstring(sum));
-  }
-  m_pSegments.reset(new std::vector<Segment>(std::move(segments)));
-  m_size = total;
-  m_pArray.reset();
+  packed::CheckTotalPoints(kMfcRecord, total, segments);
+  AdoptSegments(std::move(segments), total);
 }
 
 void operator<<(CArchive& ar, InputArray& a) {

@@ -40,9 +40,7 @@ void InputArray::Serialize(Archive& ar) {
       if (total > UINT_MAX) packed::Reject(kArchiveRecord, L"more than 2^32 - 1 points");
       segments.push_back(s);
     }
-    m_pSegments.reset(new std::vector<Segment>(std::move(segments)));
-    m_size = static_cast<unsigned int>(total);
-    m_pArray.reset();
+    AdoptSegments(std::move(segments), static_cast<unsigned int>(total));
   } catch (LumenException& e) {
     packed::NameRecordInArchiveError(e, kArchiveRecord);
     throw;
@@ -50,12 +48,9 @@ void InputArray::Serialize(Archive& ar) {
 }
 
 int InputArray::SaveData(unsigned char* buffer, int bufferSize) const {
-  std::int64_t recordSize = kPackedHeaderBytes;
-  for (const Segment& s : GetSegments()) {
-    recordSize += s.SaveData(nullptr, 0);
-    if (recordSize > INT_MAX) packed::Reject(kPackedRecord, L"larger than 2^31 - 1 bytes");
-  }
-  const int size = static_cast<int>(recordSize);
+  std::uint64_t recordSize = kPackedHeaderBytes;
+  for (const Segment& s : GetSegments()) recordSize += s.SaveData(nullptr, 0);
+  const int size = packed::RecordSize(recordSize, kPackedRecord);
   if (!buffer) return size;
   if (bufferSize < size) return 0;
   packed::StoreAt<std::int32_t>(buffer, 0, size);
@@ -99,7 +94,6 @@ int InputArray::RecallData(const unsigned char* buffer, int bufferSize) {
                                       std::to_wstring(segmentBytes) + L" bytes");
   }
   std::vector<Segment> segments(count);
-  std::uint64_t sum = 0;
   const int end = kPackedHeaderBytes + segmentBytes;
   int offset = kPackedHeaderBytes;
   for (std::uint32_t k = 0; k < count; ++k) {
@@ -109,16 +103,16 @@ int InputArray::RecallData(const unsigned char* buffer, int bufferSize) {
       e.AddMessage(std::wstring(kPackedRecord) + L": segment " + std::to_wstring(k));
       throw;
     }
-    sum += segments[k].size();
   }
-  if (sum != total) {
-    packed::Reject(kPackedRecord, L"total point count " + std::to_wstring(total) +
-                                      L" is not the segments' " + std::to_wstring(sum));
-  }
+  packed::CheckTotalPoints(kPackedRecord, total, segments);
+  AdoptSegments(std::move(segments), total);
+  return recordSize;
+}
+
+void InputArray::AdoptSegments(std::vector<Segment>&& segments, unsigned int total) {
   m_pSegments.reset(new std::vector<Segment>(std::move(segments)));
   m_size = total;
   m_pArray.reset();
-  return recordSize;
 }
 
 }  // namespace LumenUtility

@@ -7,7 +7,10 @@
 #include <cstring>
 #include <string>
 
+#include <vector>
+
 #include "lumen/platform/lumen_exception.h"
+#include "lumen/stimulus/segment.h"
 
 namespace LumenUtility::packed {
 
@@ -29,6 +32,13 @@ inline constexpr std::int64_t kMaxSegmentType = 3;
 
 // Throws LumenException 0xE8080882 with "<record>: <problem>".
 [[noreturn]] void Reject(const wchar_t* record, const std::wstring& problem);
+
+// `bytes` as a packed record size; throws (naming `record`) past 2^31 - 1.
+int RecordSize(std::uint64_t bytes, const wchar_t* record);
+
+// Throws (naming `record`) unless the segments hold `total` points together.
+void CheckTotalPoints(const wchar_t* record, std::uint64_t total,
+                      const std::vector<Segment>& segments);
 
 // Adds `record` as a second message to an archive's own error (end of buffer, failed read),
 // which cannot know what it was reading.

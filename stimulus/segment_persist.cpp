@@ -78,10 +78,8 @@ void Segment::Serialize(Archive& ar) {
 }
 
 int Segment::SaveData(unsigned char* buffer, int bufferSize) const {
-  const std::uint64_t recordSize =
-      kPackedHeaderBytes + (m_type == Arbitrary ? PointBytes(m_numPoints) : 0);
-  if (recordSize > INT_MAX) packed::Reject(kPackedRecord, L"larger than 2^31 - 1 bytes");
-  const int size = static_cast<int>(recordSize);
+  const int size = packed::RecordSize(
+      kPackedHeaderBytes + (m_type == Arbitrary ? PointBytes(m_numPoints) : 0), kPackedRecord);
   if (!buffer) return size;
   if (bufferSize < size) return 0;
   packed::StoreAt<std::int32_t>(buffer, 0, size);

@@ -191,6 +191,8 @@ class LUMEN_API InputArray {
   void AdoptRunsIfSimpler(bool linearRuns);
   void RefreshCache() const;
   void ClearCache();
+  // Takes `segments` (holding `total` points together) as the new, unflattened list.
+  void AdoptSegments(std::vector<Segment>&& segments, unsigned int total);
 
   unsigned int m_size;
   boost::shared_ptr<std::vector<Segment>> m_pSegments;
