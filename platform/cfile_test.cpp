@@ -150,6 +150,7 @@ TEST(CFile, AccessOutsideTheOpenModeThrowsAtOnce) {
 }
 
 TEST(CFile, RefusedBufferedBytesSurfaceAtFlushAndClose) {
+  if (access("/dev/full", W_OK) != 0) GTEST_SKIP() << "no /dev/full here";
   CFile full(L"/dev/full", CFile::modeWrite);
   full.Write("abc", 3);  // buffered: the refusal comes later
   try {

@@ -1,6 +1,7 @@
 // A scratch directory for file tests, removed with everything in it when the test ends.
 #pragma once
 
+#include <cstdlib>
 #include <filesystem>
 #include <string>
 
