@@ -67,6 +67,7 @@ void Export(const ExportOptions& options) {
     WriteTable(options, std::cout);
     return;
   }
+  RefuseOutputOverInput(options.output, options.path);
   WriteOutputFile(options.output, [&](std::ostream& out) { WriteTable(options, out); });
 }
 

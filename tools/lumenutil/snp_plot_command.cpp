@@ -81,6 +81,7 @@ std::string Render(const PlotOptions& options) {
 }
 
 void Plot(const PlotOptions& options) {
+  RefuseOutputOverInput(options.output, options.path);
   const std::string svg = Render(options);
   WriteOutputFile(options.output, [&](std::ostream& out) { out << svg; });
 }
