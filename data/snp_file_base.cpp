@@ -1,6 +1,7 @@
 #include "lumen/data/snp_file_base.h"
 
-#include <sys/stat.h>
+#include <fcntl.h>
+#include <unistd.h>
 
 #include <algorithm>
 #include <cerrno>
@@ -8,6 +9,7 @@
 #include <cstring>
 #include <cwchar>
 #include <memory>
+#include <utility>
 #include <string>
 
 #include "data/touchstone_parser.h"
@@ -17,12 +19,23 @@ using LumenUtility::InputArray;
 
 namespace {
 
-// Reading in blocks this large keeps the number of system calls small (about ten for a
-// 10 MB file) while the parse runs over one contiguous buffer.
-constexpr std::size_t kReadBlock = std::size_t{1} << 20;
+// Reads a descriptor in chunks, retrying reads a signal interrupted.
+class DescriptorSource : public LumenUtility::TouchstoneSource {
+ public:
+  explicit DescriptorSource(int fd) : m_fd(fd) {}
+  std::size_t Read(char* buffer, std::size_t capacity) override {
+    for (;;) {
+      const ssize_t got = ::read(m_fd, buffer, capacity);
+      if (got >= 0) return static_cast<std::size_t>(got);
+      if (errno != EINTR) {
+        throw LumenUtility::TouchstoneScanError(std::string("the file cannot be read: ") +
+                                                std::strerror(errno));
+      }
+    }
+  }
 
-struct FileCloser {
-  void operator()(std::FILE* f) const { std::fclose(f); }
+ private:
+  int m_fd;
 };
 
 // Index of the stored pair that holds matrix position (row, column), both from 1, in a
@@ -49,34 +62,29 @@ CSnPFileBase::CSnPFileBase(int ports)
 
 int CSnPFileBase::ReadSNPFile(const std::wstring& path) {
   const std::string narrowPath = LumenUtility::WideToUtf8(path);
-  std::unique_ptr<std::FILE, FileCloser> file(std::fopen(narrowPath.c_str(), "rb"));
-  if (!file) {
+  const int fd = ::open(narrowPath.c_str(), O_RDONLY | O_CLOEXEC);
+  if (fd < 0) {
     m_readError = L"cannot open the file: " + LumenUtility::Utf8ToWide(std::strerror(errno));
     return -1;
   }
-  std::string text;
-  struct stat status;
-  if (fstat(fileno(file.get()), &status) == 0 && S_ISREG(status.st_mode)) {
-    text.reserve(static_cast<std::size_t>(status.st_size) + kReadBlock);
-  }
-  std::size_t used = 0;
-  for (;;) {
-    text.resize(used + kReadBlock);
-    const std::size_t got = std::fread(text.data() + used, 1, kReadBlock, file.get());
-    used += got;
-    if (got < kReadBlock) break;
-  }
-  text.resize(used);
-  if (std::ferror(file.get())) {
-    m_readError = L"the file cannot be read: " + LumenUtility::Utf8ToWide(std::strerror(errno));
-    return -1;
-  }
-  return ReadSNPText(text);
+  const int points = ReadSNPDescriptor(fd);
+  ::close(fd);
+  return points;
+}
+
+int CSnPFileBase::ReadSNPDescriptor(int fd) {
+  DescriptorSource source(fd);
+  LumenUtility::TouchstoneParser parser(source, static_cast<int>(GetSNPType()));
+  return ReadParsed(parser);
 }
 
 int CSnPFileBase::ReadSNPText(std::string_view text) {
-  LumenUtility::TouchstoneContent content;
   LumenUtility::TouchstoneParser parser(text, static_cast<int>(GetSNPType()));
+  return ReadParsed(parser);
+}
+
+int CSnPFileBase::ReadParsed(LumenUtility::TouchstoneParser& parser) {
+  LumenUtility::TouchstoneContent content;
   if (!parser.Parse(content)) {
     m_readError = LumenUtility::Utf8ToWide(parser.Error());
     return -1;
@@ -89,12 +97,13 @@ int CSnPFileBase::ReadSNPText(std::string_view text) {
   }
   m_twoPortOrder21 = content.twoPortOrder21;
   if (content.resultTypeGiven) m_resultType = content.resultType;
-  m_info = content.info;
+  m_info = std::move(content.info);
+  m_info.pointLines = std::move(content.pointLines);
   m_readError.clear();
 
   const InputArray stimulus(content.stimulus);
   const std::size_t points = content.stimulus.size();
-  const bool noise = content.info.noisePoints > 0;
+  const bool noise = m_info.noisePoints > 0;
   const wchar_t* prefix = noise ? L"Noise Figure Cold Source:" : L"";
 
   // Noise traces of an earlier read describe another file: they go, whether or not this file
@@ -103,7 +112,7 @@ int CSnPFileBase::ReadSNPText(std::string_view text) {
   if (noise) {
     static const wchar_t* const kNoiseNames[3] = {L"NFmin", L"GammaOpt", L"Rn"};
     static const ESNPForm kNoiseForms[3] = {SNP_DB, SNP_MA, SNP_RI};
-    const std::size_t records = std::min<std::size_t>(content.info.noisePoints, points);
+    const std::size_t records = std::min<std::size_t>(m_info.noisePoints, points);
     for (int t = 0; t < 3; ++t) {
       CSNParameter trace(stimulus);
       trace.SetStimulus(stimulus);
@@ -119,7 +128,7 @@ int CSnPFileBase::ReadSNPText(std::string_view text) {
   }
 
   const std::size_t pairs = static_cast<std::size_t>(content.pairsPerPoint);
-  const SnPMatrixFormat format = content.info.matrixFormat;
+  const SnPMatrixFormat format = m_info.matrixFormat;
   for (int k = 0; k < n * n; ++k) {
     const int row = k / n + 1;
     const int column = k % n + 1;
@@ -134,7 +143,7 @@ int CSnPFileBase::ReadSNPText(std::string_view text) {
     for (std::size_t i = 0; i < points; ++i) {
       const std::size_t at = 2 * (source + i * pairs);
       data[i] =
-          CSNParameter::FromPair(content.values[at], content.values[at + 1], content.info.form);
+          CSNParameter::FromPair(content.values[at], content.values[at + 1], m_info.form);
     }
     // Named after the matrix position the trace lands in (for a two-port file in 11, 21,
     // 12, 22 order the second pair read is S21).
@@ -143,6 +152,16 @@ int CSnPFileBase::ReadSNPText(std::string_view text) {
     GetLoopParam(k) = std::move(trace);
   }
   return static_cast<int>(points);
+}
+
+std::wstring SnPUnitName(const std::string& unitToken) {
+  static const std::pair<const char*, const wchar_t*> kNames[] = {
+      {"HZ", L"Hz"},  {"KHZ", L"kHz"}, {"MHZ", L"MHz"},          {"GHZ", L"GHz"},
+      {"SEC", L"s"}, {"DBM", L"dBm"}, {"POINT", L"point numbers"}};
+  for (const auto& [token, name] : kNames) {
+    if (unitToken == token) return name;
+  }
+  return LumenUtility::Utf8ToWide(unitToken);
 }
 
 int SnPPortCountFromFileName(const std::wstring& path) {

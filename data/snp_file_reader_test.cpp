@@ -9,6 +9,7 @@
 #include <string>
 
 #include "lumen/data.h"
+#include "lumen/platform.h"
 
 using LumenUtility::TsComplex;
 
@@ -60,10 +61,7 @@ class SnPReaderTest : public ::testing::Test {
     const int n = reader->GetSNPType();
     return reader->GetParam(static_cast<ESNParam>((row - 1) * n + column - 1)).GetData().at(point);
   }
-  std::string Error() const {
-    const std::wstring& e = reader->GetReadError();
-    return std::string(e.begin(), e.end());
-  }
+  std::string Error() const { return LumenUtility::WideToUtf8(reader->GetReadError()); }
 
   std::unique_ptr<CSnPFileBase> reader;
 };
@@ -233,7 +231,7 @@ TEST_F(SnPReaderTest, MalformedFilesGiveMinusOneWithTheLine) {
       {Replace(kV2TwoPort, "[Version]", "[Ports]"), "[PORTS]"},
       {Replace(kV2TwoPort, "[Version] 2.0", "[Version 2.0"), "]"},
       {Replace(kV1TwoPort, "# GHZ S MA R 50", "GHZ S MA R 50"), "option line"},
-      {Replace(kV1TwoPort, "R 50", "R"), "reference resistance"},
+      {Replace(kV1TwoPort, "R 50", "R ohms"), "reference resistance, not 'ohms'"},
       {Replace(kV2TwoPort, "[Number of Ports] 2", "[Reference] 50 50"), "[Number of Ports]"},
       {Replace(kV2TwoPort, "[Number of Ports] 2", "[Number of Ports] 0"), "outside 1 to 999"},
       {Replace(kV2TwoPort, "[Number of Ports] 2", "[Number of Ports] 1000"), "outside"},
@@ -275,8 +273,116 @@ TEST_F(SnPReaderTest, DeclaredFrequencyCountEndsTheNetworkData) {
       "[Network Data]\n1 1 0\n2 2 0\n3 3 0\n4 4 0\n5 5 0\n";
   EXPECT_EQ(Read(text), 3);
   EXPECT_EQ(reader->GetParam(SNP_S11).GetStopFreq(), 3.0);
+  EXPECT_TRUE(reader->GetFileInfo().extraPointsIgnored);
+  EXPECT_EQ(Read(Replace(text, "] 3", "] 5")), 5);
+  EXPECT_FALSE(reader->GetFileInfo().extraPointsIgnored);
+}
+
+// Bad input read from memory, each checked against the whole message.
+class SnPReaderMessageTest : public SnPReaderTest {
+ protected:
+  std::string ErrorOf(const std::string& text, int ports = 2) {
+    CSnPFileBase file(ports);
+    EXPECT_EQ(file.ReadSNPText(text), -1) << text;
+    return LumenUtility::WideToUtf8(file.GetReadError());
+  }
+  static constexpr const char* kV2OnePort =
+      "[Version] 2.0\n# Hz RI\n[Number of Ports] 1\n[Number of Frequencies] 4\n"
+      "[Network Data]\n1 1 0\n2 2 0\n";
+};
+
+TEST_F(SnPReaderMessageTest, TruncatedVersionTwoDataSaysDeclaredAndFoundCounts) {
+  const std::string expected =
+      "line 8: [Number of Frequencies] declares 4 points, but the network data holds 2: the "
+      "file is truncated";
+  EXPECT_EQ(ErrorOf(kV2OnePort, 1), expected);
+  EXPECT_EQ(ErrorOf(std::string(kV2OnePort) + "[End]\n", 1),
+            "line 8: [Number of Frequencies] declares 4 points, but the network data holds 2: "
+            "the file is truncated");
   // The count is never taken as a size to reserve.
-  EXPECT_EQ(Read(Replace(text, "] 3", "] 2000000000")), 5);
+  EXPECT_NE(ErrorOf(Replace(kV2OnePort, "] 4", "] 2000000000"), 1).find("declares 2000000000"),
+            std::string::npos);
+}
+
+TEST_F(SnPReaderMessageTest, ValuesBeyondTheirRangeFailWithTheLine) {
+  EXPECT_EQ(ErrorOf("# GHz RI\n1 0.5 0 0 0 0 0 0 0\n1e300 0.5 0 0 0 0 0 0 0\n"),
+            "line 3: '1e300' GHz is beyond the range of a stimulus value");
+  EXPECT_EQ(ErrorOf("# Hz RI\n1 0.5 0 1e39 0 0 0 0 0\n"),
+            "line 2: '1e39' is beyond the range of a single-precision value (in the data point "
+            "that starts at line 2)");
+  EXPECT_EQ(ErrorOf("# Hz RI\n1 0.5 0 1e400 0 0 0 0 0\n"),
+            "line 2: '1e400' is beyond the range of a single-precision value (in the data point "
+            "that starts at line 2)");
+  EXPECT_EQ(ErrorOf("# Hz DB\n1\n 0 0 800 0\n 0 0 0 0\n"),
+            "line 2: '800' dB in this data point is beyond the range of a single-precision value");
+  EXPECT_EQ(ErrorOf("# Hz RI\n1e400 0 0 0 0 0 0 0 0\n"),
+            "line 2: '1e400' is beyond the range of a number (a stimulus value was expected)");
+  // Within range, the largest magnitudes still read.
+  CSnPFileBase file(1);
+  EXPECT_EQ(file.ReadSNPText("# Hz DB\n1 770 0\n1e308 -3e38 0\n"), 2);
+}
+
+TEST_F(SnPReaderMessageTest, UnprintableBytesAreQuotedAsHex) {
+  EXPECT_EQ(ErrorOf(std::string("# Hz RI\n1 0.5 0 a\0b\x1B\xFF 0 0 0 0 0\n", 32)),
+            "line 2: 'a\\x00b\\x1B\\xFF' is not a number (in the data point that starts at "
+            "line 2)");
+  // Well-formed UTF-8 stays as it is.
+  EXPECT_EQ(ErrorOf("# Hz RI\n1 0.5 0 \xC2\xB5 0 0 0 0 0\n"),
+            "line 2: '\xC2\xB5' is not a number (in the data point that starts at line 2)");
+}
+
+TEST_F(SnPReaderMessageTest, AFailureAfterAFrequencyDropHintsAtNoiseData) {
+  // Noise records (five values) read as network points (nine values) without the marker.
+  EXPECT_EQ(ErrorOf(std::string(kV1TwoPort) + "1 2 0.5 45 0.2\n"),
+            "line 6: the file ends inside the data point that starts at line 5: 8 values "
+            "expected, 4 found (the frequency drops at line 5; noise data there needs a '! "
+            "Noise Parameters' comment before it)");
+}
+
+TEST_F(SnPReaderTest, LoneCarriageReturnsEndLines) {
+  std::string text = "! old Mac text\r# GHZ S MA R 50\r1 0.5 0 0.1 90 0.2 0 0.4 45\r"
+                     "2 0.6 10 0.3 80 0.2 5 0.5 40\r";
+  ASSERT_EQ(Read(text), 2) << Error();
+  ExpectPolar(Value(2, 2, 1), 0.5, 40);
+  EXPECT_EQ(reader->GetFileInfo().pointLines, (std::vector<int>{3, 4}));
+  // Lines still count right in a mix, CR LF being one line end.
+  EXPECT_EQ(Read(Replace(text, "0.3 80", "0.3 x")), -1);
+  EXPECT_EQ(Error().rfind("line 4: 'x'", 0), 0u) << Error();
+  EXPECT_EQ(Read("# Hz RI\r\n\r1 1 0 0 0 0 0 0 0\n\r\nx"), -1);
+  EXPECT_EQ(Error().rfind("line 5: 'x'", 0), 0u) << Error();
+}
+
+TEST_F(SnPReaderTest, FilesFromTheFieldRead) {
+  // [Reference] one value per line, each with a comment naming its port.
+  const std::string reference = Replace(
+      kV2TwoPort, "[Network Data]", "[Reference]\n  50  ! Port[1]\n  75  ! Port[2]\n[Network Data]");
+  ASSERT_EQ(Read(reference), 2) << Error();
+  EXPECT_EQ(reader->GetFileInfo().portReferences, (std::vector<double>{50, 75}));
+
+  // A bare R keeps the default of 50 ohms and says so.
+  ASSERT_EQ(Read(Replace(kV1TwoPort, "R 50", "R")), 2) << Error();
+  EXPECT_EQ(reader->GetFileInfo().referenceResistance, 50.0);
+  EXPECT_FALSE(reader->GetFileInfo().referenceResistanceGiven);
+  ASSERT_EQ(Read(kV1TwoPort), 2);
+  EXPECT_TRUE(reader->GetFileInfo().referenceResistanceGiven);
+
+  // The noise marker in any case.
+  for (const char* marker : {"! NOISE PARAMETERS\n", "! noise parameters\n"}) {
+    ASSERT_EQ(Read(std::string(kV1TwoPort) + marker + "1 2 0.5 45 0.2\n"), 2) << marker;
+    EXPECT_EQ(reader->GetFileInfo().noisePoints, 1) << marker;
+  }
+
+  // Tokens the reader does not know are ignored and listed.
+  ASSERT_EQ(Read(Replace(kV1TwoPort, "# GHZ", "# THz Q GHZ")), 2);
+  EXPECT_EQ(reader->GetFileInfo().ignoredOptions, (std::vector<std::string>{"THZ", "Q"}));
+  EXPECT_EQ(reader->GetParam(SNP_S11).GetStartFreq(), 1e9);
+}
+
+TEST_F(SnPReaderMessageTest, ComplexReferenceImpedancesAreRefused) {
+  EXPECT_EQ(ErrorOf("# GHz S RI R (50+50j)\n"),
+            "line 1: option R '(50+50j)': complex reference impedances are not supported");
+  EXPECT_EQ(ErrorOf("# GHz S RI R 50+50j\n"),
+            "line 1: option R '50+50j': complex reference impedances are not supported");
 }
 
 TEST_F(SnPReaderTest, FailedReadLeavesTheEarlierTracesAndVersionTwoReplacesThePortCount) {

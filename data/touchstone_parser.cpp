@@ -1,17 +1,56 @@
 #include "data/touchstone_parser.h"
 
+#include <cmath>
+#include <cstdio>
 #include <string>
+
+#include "lumen/platform/text_conversion.h"
 
 namespace LumenUtility {
 namespace {
 
-// A comment holding this text (case as written) announces noise data in a version 1 file.
+// A comment holding this text (in any case) announces noise data in a version 1 file.
 constexpr std::string_view kNoiseMarker = "Noise Parameters";
+
+// Length of the well-formed UTF-8 sequence at the start of `text`, or 0.
+std::size_t Utf8SequenceLength(std::string_view text) {
+  const auto lead = static_cast<unsigned char>(text[0]);
+  const std::size_t length = lead >= 0xF0 && lead <= 0xF4   ? 4
+                             : lead >= 0xE0                 ? 3
+                             : lead >= 0xC2 && lead <= 0xDF ? 2
+                                                            : 0;
+  if (length == 0 || length > text.size()) return 0;
+  for (std::size_t i = 1; i < length; ++i) {
+    if ((static_cast<unsigned char>(text[i]) & 0xC0) != 0x80) return 0;
+  }
+  return length;
+}
 
 std::string Quote(std::string_view token) {
   // Long tokens are cut: an error message names the culprit, it does not reprint the file.
+  // Control bytes and bytes that are not UTF-8 are shown as \xNN, so a NUL or an escape
+  // sequence reaches the reader of the message as text.
   constexpr std::size_t kShown = 40;
-  std::string text = "'" + std::string(token.substr(0, kShown));
+  std::string text = "'";
+  const std::string_view shown = token.substr(0, kShown);
+  for (std::size_t i = 0; i < shown.size();) {
+    const auto byte = static_cast<unsigned char>(shown[i]);
+    const std::size_t sequence = byte >= 0x80 ? Utf8SequenceLength(shown.substr(i)) : 0;
+    if (sequence > 0) {
+      text.append(shown.substr(i, sequence));
+      i += sequence;
+      continue;
+    }
+    if (byte < 0x20 || byte >= 0x7F) {
+      static const char kHex[] = "0123456789ABCDEF";
+      text += "\\x";
+      text += kHex[byte >> 4];
+      text += kHex[byte & 0xF];
+    } else {
+      text += shown[i];
+    }
+    ++i;
+  }
   if (token.size() > kShown) text += "...";
   return text + "'";
 }
@@ -19,7 +58,10 @@ std::string Quote(std::string_view token) {
 }  // namespace
 
 TouchstoneParser::TouchstoneParser(std::string_view text, int ports)
-    : m_text(text), m_ports(ports), m_scanner(text) {}
+    : m_ports(ports), m_scanner(text) {}
+
+TouchstoneParser::TouchstoneParser(TouchstoneSource& source, int ports)
+    : m_ports(ports), m_scanner(source) {}
 
 bool TouchstoneParser::Fail(const std::string& message) {
   return FailAtLine(m_scanner.Line(), message);
@@ -27,6 +69,11 @@ bool TouchstoneParser::Fail(const std::string& message) {
 
 bool TouchstoneParser::FailAtLine(int line, const std::string& message) {
   m_error = "line " + std::to_string(line) + ": " + message;
+  if (m_frequencyDropLine > 0) {
+    // The usual cause: the noise records of a two-port file, read as more network data.
+    m_error += " (the frequency drops at line " + std::to_string(m_frequencyDropLine) +
+               "; noise data there needs a '! Noise Parameters' comment before it)";
+  }
   return false;
 }
 
@@ -37,21 +84,27 @@ bool TouchstoneParser::Parse(TouchstoneContent& content) {
   if (m_ports < 1 || m_ports > CSnPFileBase::kMaxPorts) {
     return FailAtLine(0, "a network of " + std::to_string(m_ports) + " ports is not read");
   }
-  return ReadByteOrderMark() && ReadVersionAndOptionLine() && ReadKeywords() && ReadNetworkData();
+  try {
+    return ReadByteOrderMark() && ReadVersionAndOptionLine() && ReadKeywords() &&
+           ReadNetworkData();
+  } catch (const TouchstoneScanError& e) {
+    m_error = e.what();
+    return false;
+  }
 }
 
 bool TouchstoneParser::ReadByteOrderMark() {
-  if (m_text.empty()) return true;
-  const auto first = static_cast<unsigned char>(m_text[0]);
+  const std::string_view start = m_scanner.Peek(3);
+  if (start.empty()) return true;
+  const auto first = static_cast<unsigned char>(start[0]);
   if (first == 0xFF || first == 0xFE) {
     return FailAtLine(1, "UTF-16 text is not read; save the file as UTF-8 or ASCII");
   }
   if (first != 0xEF) return true;
-  if (m_text.size() < 3 || static_cast<unsigned char>(m_text[1]) != 0xBB ||
-      static_cast<unsigned char>(m_text[2]) != 0xBF) {
+  if (start != "\xEF\xBB\xBF") {
     return FailAtLine(1, "the file starts with a broken UTF-8 byte-order mark");
   }
-  m_scanner = TouchstoneScanner(m_text.substr(3));
+  m_scanner.Skip(3);
   return true;
 }
 
@@ -72,6 +125,7 @@ bool TouchstoneParser::ReadVersionAndOptionLine() {
     first = m_scanner.PeekLineStart();
   }
   if (first != '#') return Fail("the option line (starting with '#') is missing");
+  m_optionLine = m_scanner.Line();
   std::string_view line = m_scanner.RestOfLine();
   line.remove_prefix(1);
   if (!ReadOptionLine(line)) return false;
@@ -118,10 +172,21 @@ bool TouchstoneParser::ReadOptionLine(std::string_view line) {
     } else if (option == "RI" || option == "MA" || option == "DB") {
       info.form = option == "RI" ? SNP_RI : option == "MA" ? SNP_MA : SNP_DB;
     } else if (option == "R") {
+      // Some exporters write a bare R and give per-frequency impedances in comments: the
+      // default of 50 ohms then stands.
       const std::string_view value = tokens.NextToken();
-      if (value.empty() || !ParseStreamDouble(value, info.referenceResistance)) {
-        return Fail("option R needs a reference resistance, not " + Quote(value));
+      if (value.empty()) continue;
+      if (value.front() == '(' || value.find_first_of("jJ") != std::string_view::npos) {
+        return FailAtLine(m_optionLine, "option R " + Quote(value) +
+                                            ": complex reference impedances are not supported");
       }
+      if (!ParseStreamDouble(value, info.referenceResistance)) {
+        return FailAtLine(m_optionLine,
+                          "option R needs a reference resistance, not " + Quote(value));
+      }
+      info.referenceResistanceGiven = true;
+    } else {
+      info.ignoredOptions.push_back(option);
     }
   }
   return true;
@@ -164,7 +229,8 @@ bool TouchstoneParser::ReadKeywordValue(const std::string& name) {
   } else if (name == "REFERENCE") {
     c.info.portReferences.clear();
     for (int port = 0; port < c.ports; ++port) {
-      const std::string_view token = m_scanner.NextToken();
+      // Simulators write one value per line, each followed by a comment naming its port.
+      const std::string_view token = m_scanner.NextValueToken();
       double ohms = 0.0;
       if (!ParseStreamDouble(token, ohms)) {
         return Fail("[Reference] needs one resistance per port, not " + Quote(token));
@@ -191,7 +257,11 @@ bool TouchstoneParser::ReadRecordValues(int count, int recordLine, const char* w
     }
     float value = 0.0f;
     if (!ParseStreamFloat(token, value)) {
-      return Fail(Quote(token) + " is not a number (in the " + what + " that starts at line " +
+      double wide = 0.0;
+      const char* problem = ParseStreamDouble(token, wide) || IsBeyondDouble(token)
+                                ? " is beyond the range of a single-precision value"
+                                : " is not a number";
+      return Fail(Quote(token) + problem + " (in the " + what + " that starts at line " +
                   std::to_string(recordLine) + ")");
     }
     out.push_back(value);
@@ -208,20 +278,24 @@ bool TouchstoneParser::ReadNetworkData() {
   const int valuesPerPoint = 2 * c.pairsPerPoint;
   for (;;) {
     const std::string_view token = m_scanner.NextValueToken(kNoiseMarker, &m_noiseMarked);
-    if (token.empty()) return true;
-    if (token.front() == '[') return ReadDataKeyword(token);
+    if (token.empty()) return RequireDeclaredPoints();
+    if (token.front() == '[') return RequireDeclaredPoints() && ReadDataKeyword(token);
     double stimulus = 0.0;
-    if (!ParseStreamDouble(token, stimulus)) {
-      return Fail(Quote(token) + " is not a number (a stimulus value was expected)");
-    }
-    stimulus *= c.info.stimulusMultiplier;
-    if (c.ports == 2 && m_noiseMarked && !c.stimulus.empty() && stimulus <= c.stimulus.back()) {
+    if (!ReadStimulus(token, "a stimulus value", stimulus)) return false;
+    const bool drop = !c.stimulus.empty() && stimulus <= c.stimulus.back();
+    if (c.ports == 2 && m_noiseMarked && drop) {
+      if (!RequireDeclaredPoints()) return false;
       return ReadNoiseData(true);
     }
-    if (!ReadRecordValues(valuesPerPoint, m_scanner.Line(), "data point", c.values)) {
-      return false;
+    const int line = m_scanner.Line();
+    if (drop && c.ports == 2 && c.info.version == 1 && m_frequencyDropLine == 0) {
+      m_frequencyDropLine = line;
     }
+    const std::size_t first = c.values.size();
+    if (!ReadRecordValues(valuesPerPoint, line, "data point", c.values)) return false;
+    if (c.info.form == SNP_DB && !CheckDecibels(first, line)) return false;
     c.stimulus.push_back(stimulus);
+    c.pointLines.push_back(line);
     if (c.info.declaredFrequencies > 0 &&
         c.stimulus.size() == static_cast<std::size_t>(c.info.declaredFrequencies)) {
       return ReadAfterDeclaredPoints();
@@ -229,10 +303,54 @@ bool TouchstoneParser::ReadNetworkData() {
   }
 }
 
+bool TouchstoneParser::ReadStimulus(std::string_view token, const char* what, double& value) {
+  if (!ParseStreamDouble(token, value)) {
+    return Fail(Quote(token) + (IsBeyondDouble(token) ? " is beyond the range of a number ("
+                                                      : " is not a number (") +
+                what + " was expected)");
+  }
+  value *= m_content->info.stimulusMultiplier;
+  if (!std::isfinite(value)) {
+    return Fail(Quote(token) + " " + WideToUtf8(SnPUnitName(m_content->info.stimulusUnit)) +
+                " is beyond the range of a stimulus value");
+  }
+  return true;
+}
+
+bool TouchstoneParser::CheckDecibels(std::size_t first, int line) {
+  // 10^(dB/20) passes the largest float (3.4e38) above 770.6 dB.
+  const std::vector<float>& values = m_content->values;
+  for (std::size_t i = first; i < values.size(); i += 2) {
+    if (values[i] <= 770.0f) continue;
+    const TsComplex value = CSNParameter::FromPair(values[i], values[i + 1], SNP_DB);
+    if (!(std::isfinite(value.re) && std::isfinite(value.im))) {
+      char text[32];
+      std::snprintf(text, sizeof text, "%g", values[i]);
+      return FailAtLine(line, std::string("'") + text +
+                                  "' dB in this data point is beyond the range of a "
+                                  "single-precision value");
+    }
+  }
+  return true;
+}
+
+bool TouchstoneParser::RequireDeclaredPoints() {
+  const TouchstoneContent& c = *m_content;
+  const std::size_t declared = static_cast<std::size_t>(c.info.declaredFrequencies);
+  if (declared == 0 || c.stimulus.size() >= declared) return true;
+  return Fail("[Number of Frequencies] declares " + std::to_string(declared) +
+              " points, but the network data holds " + std::to_string(c.stimulus.size()) +
+              ": the file is truncated");
+}
+
 bool TouchstoneParser::ReadAfterDeclaredPoints() {
   // Points past the declared count are not read; a [Noise Data] section still is.
   const std::string_view token = m_scanner.NextValueToken();
-  if (token.empty() || token.front() != '[') return true;
+  if (token.empty()) return true;
+  if (token.front() != '[') {
+    m_content->info.extraPointsIgnored = true;
+    return true;
+  }
   return ReadDataKeyword(token);
 }
 
@@ -263,15 +381,17 @@ bool TouchstoneParser::ReadNoiseData(bool firstStimulus) {
         return Fail(Quote(token) + " is not expected among the noise data");
       }
       double unused = 0.0;
-      if (!ParseStreamDouble(token, unused)) {
-        return Fail(Quote(token) + " is not a number (a noise stimulus value was expected)");
-      }
+      if (!ReadStimulus(token, "a noise stimulus value", unused)) return false;
     }
     haveStimulus = false;
     const std::size_t start = c.noise.size();
-    if (!ReadRecordValues(4, m_scanner.Line(), "noise record", c.noise)) return false;
+    const int line = m_scanner.Line();
+    if (!ReadRecordValues(4, line, "noise record", c.noise)) return false;
     c.noise[start] *= 2.0f;
     c.noise[start + 3] = static_cast<float>(c.noise[start + 3] * c.info.referenceResistance);
+    if (!std::isfinite(c.noise[start]) || !std::isfinite(c.noise[start + 3])) {
+      return FailAtLine(line, "the noise record is beyond the range of single-precision values");
+    }
     ++c.info.noisePoints;
   }
 }

@@ -1,7 +1,7 @@
 // TouchstoneParser: turns the text of a Touchstone file (version 1 or 2.0) into its
 // stimulus values and raw value pairs, ready to become traces.
 //
-// Thread-safety: one thread per object; the text must outlive the parser.
+// Thread-safety: one thread per object.
 #pragma once
 
 #include <string>
@@ -22,14 +22,17 @@ struct TouchstoneContent {
   SnPFileInfo info;
   int pairsPerPoint = 0;
   std::vector<double> stimulus;  // scaled to Hz (or the file's own unit), one per point
+  std::vector<int> pointLines;   // line of each point's stimulus value, from 1
   std::vector<float> values;     // pairsPerPoint (a, b) pairs per point, in file order
   std::vector<float> noise;      // per noise record: 2*NFmin dB, |GammaOpt|, angle deg, Rn ohms
 };
 
 class TouchstoneParser {
  public:
-  // `ports`: the port count of version 1 files (version 2 files name their own).
+  // `ports`: the port count of version 1 files (version 2 files name their own). The text,
+  // or the source, must outlive the parser.
   TouchstoneParser(std::string_view text, int ports);
+  TouchstoneParser(TouchstoneSource& source, int ports);
 
   // Fills `content`; false on malformed text, with Error() saying what and where.
   bool Parse(TouchstoneContent& content);
@@ -45,6 +48,14 @@ class TouchstoneParser {
   bool ReadKeywordValue(const std::string& name);
   bool ReadNetworkData();
   bool ReadAfterDeclaredPoints();
+  // Reads a stimulus value scaled to Hz (or the file's own unit); false, naming `what` was
+  // expected, for a token that is not a number or a value beyond the range of a double.
+  bool ReadStimulus(std::string_view token, const char* what, double& value);
+  // False when a dB value of the record whose values start at `first` gives a magnitude
+  // beyond the range of a float.
+  bool CheckDecibels(std::size_t first, int line);
+  // False when the network data ended before the count [Number of Frequencies] declares.
+  bool RequireDeclaredPoints();
   // With `token` a keyword among the data: reads [End], or the [Noise Data] section that
   // follows its keyword, either of which ends the data; false for any other keyword.
   bool ReadDataKeyword(std::string_view token);
@@ -56,7 +67,6 @@ class TouchstoneParser {
   bool ReadRecordValues(int count, int recordLine, const char* what, std::vector<float>& out);
   bool KeywordInteger(const std::string& name, int& value);
 
-  std::string_view m_text;
   int m_ports;
   TouchstoneScanner m_scanner;
   TouchstoneContent* m_content = nullptr;
@@ -64,6 +74,10 @@ class TouchstoneParser {
   // A "Noise Parameters" comment was met after the option line: a two-port file's data may
   // end in noise records.
   bool m_noiseMarked = false;
+  // Line of the first point of a two-port version 1 file whose frequency is not above the
+  // one before (0 while there is none): failures after it add a hint on noise data.
+  int m_frequencyDropLine = 0;
+  int m_optionLine = 0;  // line of the option line, for its errors
 };
 
 }  // namespace LumenUtility

@@ -38,9 +38,8 @@ void WriteTable(const ExportOptions& options, std::ostream& out) {
   std::vector<std::vector<double>> columns;
   for (const MatrixPosition& p : positions) {
     for (const std::string& name : ColumnNames(format, p.name)) out << d << name;
-    const double z0 = static_cast<int>(info.portReferences.size()) >= p.row
-                          ? info.portReferences[p.row - 1]
-                          : info.referenceResistance;
+    const bool needsZ0 = format == TraceFormat::kZ || format == TraceFormat::kY;
+    const double z0 = needsZ0 ? PortReference(file, p.row, options.path) : 0.0;
     for (std::vector<double>& column : FormatColumns(TraceAt(file, p).GetData(), format, z0)) {
       columns.push_back(std::move(column));
     }

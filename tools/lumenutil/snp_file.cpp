@@ -1,8 +1,11 @@
 #include "lumenutil/snp_file.h"
 
+#include <unistd.h>
+
 #include <charconv>
 #include <cmath>
 #include <cstdio>
+#include <iostream>
 #include <sstream>
 #include <stdexcept>
 
@@ -12,17 +15,70 @@
 namespace lumenutil {
 
 CSnPFileBase ReadTouchstone(const std::string& path, int ports) {
+  const bool standardInput = path == "-";
+  const std::string name = standardInput ? "standard input" : path;
   const std::wstring widePath = LumenUtility::Utf8ToWide(path);
-  if (ports <= 0) ports = SnPPortCountFromFileName(widePath);
+  if (ports <= 0 && !standardInput) ports = SnPPortCountFromFileName(widePath);
   if (ports <= 0) ports = 2;
   if (ports > CSnPFileBase::kMaxPorts) {
-    throw std::runtime_error(path + ": " + std::to_string(ports) + " ports are too many");
+    throw std::runtime_error(name + ": " + std::to_string(ports) + " ports are too many");
   }
   CSnPFileBase file(ports);
-  if (file.ReadSNPFile(widePath) < 0) {
-    throw std::runtime_error(path + ": " + LumenUtility::WideToUtf8(file.GetReadError()));
+  const int points =
+      standardInput ? file.ReadSNPDescriptor(STDIN_FILENO) : file.ReadSNPFile(widePath);
+  if (points < 0) {
+    throw std::runtime_error(name + ": " + LumenUtility::WideToUtf8(file.GetReadError()));
+  }
+  for (const std::string& token : file.GetFileInfo().ignoredOptions) {
+    std::cerr << "lumenutil: warning: " << name << ": " << IgnoredOptionText(token, file)
+              << '\n';
   }
   return file;
+}
+
+std::string IgnoredOptionText(const std::string& token, const CSnPFileBase& file) {
+  const SnPFileInfo& info = file.GetFileInfo();
+  const std::string unit = LumenUtility::WideToUtf8(SnPUnitName(info.stimulusUnit));
+  const std::string text = "option '" + token + "' ignored; ";
+  const bool unitLike = token.size() > 2 && token.compare(token.size() - 2, 2, "HZ") == 0;
+  if (unitLike) return text + "frequencies read in " + unit;
+  const char* form = info.form == SNP_RI ? "RI" : info.form == SNP_DB ? "DB" : "MA";
+  return text + "the file is read as " + unit + ", " + info.parameter + "-parameters, " + form +
+         ", R " + Shortest(info.referenceResistance);
+}
+
+bool IsUsableResistance(double ohms) {
+  return std::isfinite(ohms) && ohms > 0;
+}
+
+double PortReference(const CSnPFileBase& file, int port, const std::string& path) {
+  const SnPFileInfo& info = file.GetFileInfo();
+  const bool perPort = static_cast<int>(info.portReferences.size()) >= port;
+  const double ohms = perPort ? info.portReferences[port - 1] : info.referenceResistance;
+  if (!IsUsableResistance(ohms)) {
+    throw std::runtime_error(path + ": the reference resistance of port " + std::to_string(port) +
+                             " is " + Shortest(ohms) +
+                             " ohm, which is not usable: impedances and admittances need a "
+                             "resistance above 0");
+  }
+  return ohms;
+}
+
+void RequireAscendingStimulus(const CSnPFileBase& file, const std::string& path) {
+  const LumenUtility::InputArray& stimulus = file.GetParam(SNP_S11).GetStimulus();
+  const std::vector<int>& lines = file.GetFileInfo().pointLines;
+  const std::vector<double> x = stimulus.GetArray();
+  const StimulusAxis axis = AxisOf(file.GetResultType());
+  for (std::size_t i = 1; i < x.size(); ++i) {
+    if (x[i] > x[i - 1]) continue;
+    const std::string where =
+        i < lines.size() ? "line " + std::to_string(lines[i]) : "point " + std::to_string(i + 1);
+    throw std::runtime_error(path + ": " + where + ": " + WithUnit(x[i], axis.unit, axis.siPrefix) +
+                             " does not ascend from " +
+                             WithUnit(x[i - 1], axis.unit, axis.siPrefix) +
+                             " before it; interpolating needs strictly ascending " +
+                             (axis.quantity == "Frequency" ? "frequencies" : "stimulus values"));
+  }
 }
 
 namespace {

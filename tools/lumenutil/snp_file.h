@@ -9,10 +9,25 @@
 
 namespace lumenutil {
 
-// Reads the Touchstone file at `path` (UTF-8). Version 1 files are read as `ports` ports when
+// Reads the Touchstone file at `path` (UTF-8), or standard input for "-". Version 1 files are read as `ports` ports when
 // that is above 0, else as the ".sNp" extension says, else as two ports. Throws
 // std::runtime_error("PATH: line N: what is wrong") when the file cannot be read.
 CSnPFileBase ReadTouchstone(const std::string& path, int ports);
+
+// The warning for an option-line token the reader ignored, saying what the file is read as
+// instead: "option 'THZ' ignored; frequencies read in GHz". ReadTouchstone prints one per
+// such token on standard error.
+std::string IgnoredOptionText(const std::string& token, const CSnPFileBase& file);
+
+// Whether a reference resistance (ohms) can serve impedance and admittance conversions.
+bool IsUsableResistance(double ohms);
+// The reference resistance of `port` (from 1) in ohms: its [Reference] value, else the option
+// line's. Throws std::runtime_error naming `path` when it is 0, negative or not finite.
+double PortReference(const CSnPFileBase& file, int port, const std::string& path);
+
+// Throws std::runtime_error("PATH: line N: ...") naming the first point whose stimulus is
+// not above the one before: interpolation over such a trace means nothing.
+void RequireAscendingStimulus(const CSnPFileBase& file, const std::string& path);
 
 // A matrix position, rows and columns from 1, and its trace name ("S21", "S1_10").
 struct MatrixPosition {

@@ -46,7 +46,11 @@ void PrintInfo(const InfoOptions& options) {
   out << "file         " << options.path << '\n';
   out << "version      " << (info.version == 2 ? "2.0" : "1") << '\n';
   out << "ports        " << n << '\n';
-  out << "points       " << first.GetNumPoints() << '\n';
+  out << "points       " << first.GetNumPoints();
+  if (info.extraPointsIgnored) {
+    out << " (as [Number of Frequencies] declares; the points after them were ignored)";
+  }
+  out << '\n';
   out << "stimulus     ";
   if (first.GetNumPoints() > 0) {
     out << WithUnit(first.GetStartFreq(), axis.unit, axis.siPrefix) << " to "
@@ -57,11 +61,17 @@ void PrintInfo(const InfoOptions& options) {
   out << " (" << axis.quantity << ", unit " << info.stimulusUnit << " in the file)\n";
   out << "parameters   " << info.parameter << ", " << FormName(info.form) << '\n';
   out << "reference    " << Shortest(info.referenceResistance) << " ohm";
+  if (!info.referenceResistanceGiven) out << " (the file names no reference resistance)";
+  bool usable = IsUsableResistance(info.referenceResistance) || !info.portReferences.empty();
   if (!info.portReferences.empty()) {
     out << " (per port:";
-    for (double r : info.portReferences) out << ' ' << Shortest(r);
+    for (double r : info.portReferences) {
+      out << ' ' << Shortest(r);
+      usable = usable && IsUsableResistance(r);
+    }
     out << ')';
   }
+  if (!usable) out << ", not usable: impedances and admittances need a resistance above 0";
   out << '\n';
   out << "matrix       " << MatrixName(info.matrixFormat) << '\n';
   if (n == 2) {
@@ -72,6 +82,9 @@ void PrintInfo(const InfoOptions& options) {
     out << info.noisePoints << " points (NFmin, GammaOpt, Rn)\n";
   } else {
     out << "none\n";
+  }
+  for (const std::string& token : info.ignoredOptions) {
+    out << "ignored      " << IgnoredOptionText(token, file) << '\n';
   }
   out << "traces      ";
   for (const MatrixPosition& p : SelectPositions("", file)) out << ' ' << p.name;

@@ -1,5 +1,6 @@
 #include <cmath>
 #include <memory>
+#include <stdexcept>
 #include <string>
 #include <vector>
 
@@ -11,6 +12,9 @@
 
 namespace lumenutil {
 namespace {
+
+// More traces than this make a legend nobody can read and lines nobody can tell apart.
+constexpr std::size_t kMaxTraces = 64;
 
 struct PlotOptions {
   std::string path;
@@ -43,13 +47,19 @@ ChartSeries BreakAtWraps(ChartSeries s) {
 std::string Render(const PlotOptions& options) {
   const CSnPFileBase file = ReadTouchstone(options.path, options.ports);
   std::vector<MatrixPosition> positions = SelectPositions(options.params, file);
+  if (options.format == "smith" && options.params.empty()) {
+    // A Smith chart shows reflections; transmissions would only cross it.
+    std::erase_if(positions, [](const MatrixPosition& p) { return p.row != p.column; });
+  }
+  if (positions.size() > kMaxTraces) {
+    throw std::runtime_error(options.path + ": " + std::to_string(positions.size()) +
+                             " traces are too many for one plot (at most " +
+                             std::to_string(kMaxTraces) +
+                             "); choose the traces with --params, e.g. --params S21,S12");
+  }
   const std::vector<double> x = file.GetParam(SNP_S11).GetStimulus().GetArray();
   std::vector<ChartSeries> series;
   if (options.format == "smith") {
-    if (options.params.empty()) {
-      // A Smith chart shows reflections; transmissions would only cross it.
-      std::erase_if(positions, [](const MatrixPosition& p) { return p.row != p.column; });
-    }
     for (const MatrixPosition& p : positions) {
       const std::vector<std::vector<double>> ri =
           FormatColumns(TraceAt(file, p).GetData(), TraceFormat::kRI, 0);

@@ -37,11 +37,22 @@ double ReadStimulus(const std::string& text, const StimulusAxis& axis, const cha
   return *value;
 }
 
+constexpr int kMaxResamplePoints = 10'000'000;
+
 void Resample(const ResampleOptions& options) {
   CSnPFileBase file = ReadTouchstone(options.path, options.ports);
   const StimulusAxis axis = AxisOf(file.GetResultType());
   const double start = ReadStimulus(options.start, axis, "--start");
   const double stop = ReadStimulus(options.stop, axis, "--stop");
+  // A Touchstone file's frequencies ascend, and so must the sweep written into one.
+  if (start > stop) {
+    throw std::runtime_error("--start " + options.start + " is above --stop " + options.stop +
+                             ": the new sweep must ascend");
+  }
+  if (start == stop && options.points > 1) {
+    throw std::runtime_error("--start and --stop are equal: " + std::to_string(options.points) +
+                             " points need --stop above --start");
+  }
   if (options.log && (start <= 0 || stop <= 0)) {
     throw std::runtime_error("a logarithmic sweep needs --start and --stop above 0");
   }
@@ -52,6 +63,7 @@ void Resample(const ResampleOptions& options) {
   }
   const CSNParameter& s11 = file.GetParam(SNP_S11);
   if (s11.GetNumPoints() == 0) throw std::runtime_error(options.path + ": no data points");
+  RequireAscendingStimulus(file, options.path);
   const InputArray target(start, stop, options.points,
                           options.log ? LumenUtility::Log : LumenUtility::Linear);
   const double low = std::min(start, stop), high = std::max(start, stop);
@@ -87,9 +99,11 @@ void AddSnpResampleCommand(CLI::App& snp) {
   command->add_option("--start", options->start, "first stimulus value, e.g. 1.5e9, 1.5G or 1.5GHz")
       ->required();
   command->add_option("--stop", options->stop, "last stimulus value")->required();
-  command->add_option("--points", options->points, "number of points")
+  // Ten million points, far past any analyzer sweep, keep a two-port resample within about
+  // a gigabyte of memory.
+  command->add_option("--points", options->points, "number of points, 1 to 10000000")
       ->required()
-      ->check(CLI::Range(1, 100000000));
+      ->check(CLI::Range(1, kMaxResamplePoints));
   command->add_flag("--log", options->log, "logarithmic instead of linear spacing");
   command->add_flag("--hold-ends", options->holdEnds,
                     "where the sweep reaches beyond the file, hold each trace's end values");

@@ -2,9 +2,11 @@
 
 #include <algorithm>
 #include <cmath>
+#include <cstdint>
 #include <cstdio>
 #include <limits>
 #include <string>
+#include <unordered_set>
 
 #include "lumenutil/snp_file.h"
 
@@ -72,10 +74,17 @@ std::string Header(double width, double height, const std::string& title) {
          Text(width / 2, 28, title, "middle", " font-size=\"16\" font-weight=\"bold\"");
 }
 
+constexpr double kLegendRow = 22;
+
+// The picture's height: the chart's own, or more where a long legend needs it.
+double HeightFor(std::size_t legendRows) {
+  return std::max(kHeight, kTop + 12 + kLegendRow * static_cast<double>(legendRows) + 30);
+}
+
 std::string Legend(const std::vector<ChartSeries>& series, double x, double y) {
   std::string svg;
   for (std::size_t i = 0; i < series.size(); ++i) {
-    const double rowY = y + 22.0 * i;
+    const double rowY = y + kLegendRow * static_cast<double>(i);
     svg += "<line x1=\"" + Num(x) + "\" y1=\"" + Num(rowY) + "\" x2=\"" + Num(x + 28) + "\" y2=\"" +
            Num(rowY) + "\" stroke=\"" + Colour(i) + "\" stroke-width=\"2.5\"/>\n";
     svg += Text(x + 36, rowY + 4.5, series[i].name, "start");
@@ -83,11 +92,16 @@ std::string Legend(const std::vector<ChartSeries>& series, double x, double y) {
   return svg;
 }
 
-// Polylines of the points mapped to px, split where a coordinate is not finite. A trace of
-// far more points than px columns is reduced to the first, lowest, highest and last point of
-// each column, which draws the same picture.
+// Polylines of the points mapped to px, split where a coordinate is not finite.
+//
+// A trace of more points than px columns is reduced to its lowest and highest point in each
+// column, in the order the trace meets them: the stroke covers the same pixels, and a
+// 100,001-point trace draws about 1,400 vertices instead of 100,001. Where columns mean
+// nothing (a Smith chart), a point on a px the trace has already passed adds nothing to the
+// picture and is dropped; where such a run of points ends far from the last point kept, the
+// line starts anew from the run's last point, so no stroke is drawn where the trace was not.
 template <typename Map>
-std::string Polylines(const ChartSeries& s, Map map, const std::string& colour, bool decimate,
+std::string Polylines(const ChartSeries& s, Map map, const std::string& colour, bool byColumn,
                       double columns) {
   std::string svg, points;
   std::size_t count = 0;
@@ -99,29 +113,53 @@ std::string Polylines(const ChartSeries& s, Map map, const std::string& colour, 
     points.clear();
     count = 0;
   };
+  double lastX = NAN, lastY = NAN;
   const auto add = [&](double px, double py) {
     points += Num(px) + "," + Num(py) + " ";
     ++count;
+    lastX = px;
+    lastY = py;
   };
   const std::size_t n = std::min(s.x.size(), s.y.size());
-  const bool reduce = decimate && n > 4 * columns;
-  long column = std::numeric_limits<long>::min();
-  double firstY = 0, lowY = 0, highY = 0, lastY = 0, columnX = 0;
+  const bool reduce = byColumn && n > 2 * columns;
+  constexpr long kNoColumn = std::numeric_limits<long>::min();
+  long column = kNoColumn;
+  double columnX = 0, lowY = 0, highY = 0;
+  bool lowFirst = true;
+  std::unordered_set<std::int64_t> passed;  // px cells a Smith trace went through
+  double skippedX = 0, skippedY = 0;
+  bool skipped = false;
   const auto emitColumn = [&] {
-    if (column == std::numeric_limits<long>::min()) return;
-    add(columnX, firstY);
-    add(columnX, lowY);
-    add(columnX, highY);
-    add(columnX, lastY);
+    if (column == kNoColumn) return;
+    add(columnX, lowFirst ? lowY : highY);
+    if (lowY != highY) add(columnX, lowFirst ? highY : lowY);
+    column = kNoColumn;
   };
   for (std::size_t i = 0; i < n; ++i) {
     if (!std::isfinite(s.x[i]) || !std::isfinite(s.y[i])) {
       emitColumn();
-      column = std::numeric_limits<long>::min();
       flush();
+      skipped = false;
       continue;
     }
     const auto [px, py] = map(s.x[i], s.y[i]);
+    if (!byColumn) {
+      const std::int64_t cell = (std::llround(px) << 32) ^ (std::llround(py) & 0xFFFFFFFF);
+      if (!passed.insert(cell).second) {
+        skippedX = px;
+        skippedY = py;
+        skipped = true;
+        continue;
+      }
+      // Neighbouring px are less than 3 px apart; farther means the trace went elsewhere.
+      if (skipped && count > 0 && std::hypot(px - lastX, py - lastY) > 3) {
+        flush();
+        add(skippedX, skippedY);
+      }
+      skipped = false;
+      add(px, py);
+      continue;
+    }
     if (!reduce) {
       add(px, py);
       continue;
@@ -131,11 +169,15 @@ std::string Polylines(const ChartSeries& s, Map map, const std::string& colour, 
       emitColumn();
       column = c;
       columnX = px;
-      firstY = lowY = highY = py;
+      lowY = highY = py;
+      lowFirst = true;
+    } else if (py < lowY) {
+      lowY = py;
+      lowFirst = false;  // the highest point, met earlier, comes first
+    } else if (py > highY) {
+      highY = py;
+      lowFirst = true;
     }
-    lowY = std::min(lowY, py);
-    highY = std::max(highY, py);
-    lastY = py;
   }
   emitColumn();
   flush();
@@ -203,7 +245,7 @@ std::string RenderCartesianSvg(const CartesianChart& chart) {
   const auto mapX = [&](double x) { return kLeft + (x - xr.low) / (xr.high - xr.low) * plotW; };
   const auto mapY = [&](double y) { return kTop + (yr.high - y) / (yr.high - yr.low) * plotH; };
 
-  std::string svg = Header(kWidth, kHeight, chart.title);
+  std::string svg = Header(kWidth, HeightFor(chart.series.size()), chart.title);
   svg += "<clipPath id=\"plot\"><rect x=\"" + Num(kLeft) + "\" y=\"" + Num(kTop) + "\" width=\"" +
          Num(plotW) + "\" height=\"" + Num(plotH) + "\"/></clipPath>\n";
   const char* grid = "stroke=\"#d9d9d9\" stroke-width=\"1\"";
@@ -246,7 +288,7 @@ std::string RenderSmithSvg(const std::string& title, const std::vector<ChartSeri
   const auto map = [&](double re, double im) {
     return std::pair{cx + re * radius, cy - im * radius};
   };
-  std::string svg = Header(kLeft + 2 * radius + kRight + 60, kHeight, title);
+  std::string svg = Header(kLeft + 2 * radius + kRight + 60, HeightFor(series.size() + 1), title);
   svg += "<clipPath id=\"unit\"><circle cx=\"" + Num(cx) + "\" cy=\"" + Num(cy) + "\" r=\"" +
          Num(radius) + "\"/></clipPath>\n";
   const char* grid = "fill=\"none\" stroke=\"#d0d0d0\" stroke-width=\"1\"";
@@ -295,7 +337,7 @@ std::string RenderSmithSvg(const std::string& title, const std::vector<ChartSeri
     }
   }
   svg += Legend(series, cx + radius + 50, kTop + 12);
-  svg += Text(cx + radius + 50, kTop + 12 + 22.0 * series.size() + 10, "dot: first point", "start",
+  svg += Text(cx + radius + 50, kTop + 12 + kLegendRow * static_cast<double>(series.size()) + 10, "dot: first point", "start",
               " font-size=\"11\" fill=\"#707070\"");
   svg += "</svg>\n";
   return svg;

@@ -75,11 +75,21 @@ printf '# GHz S MA R 50\n! Noise Parameters\n1 0.5 0 0.1 90 0.2 0 0.4 45\n2 0.6 
 same_export "$work/noise.s2p" "$work/noise_out.s2p"
 
 for args in "--start x --stop 2G --points 3" "--start 0 --stop 2G --points 3 --log" \
-            "--start 1G --stop 2G --points 0"; do
+            "--start 1G --stop 2G --points 0" "--start 1G --stop 2G --points 10000001"; do
   # shellcheck disable=SC2086
   "$tool" snp resample "$work/noise.s2p" $args -o "$work/bad.s2p" 2>/dev/null &&
     fail "accepted: $args"
 done
+# The sweep written must ascend; one point at a single frequency is a sweep.
+message=$("$tool" snp resample "$example" --start 3G --stop 2G --points 3 -o "$work/d.s2p" 2>&1) &&
+  fail "a descending sweep was accepted"
+expect_line "$message" '^lumenutil: --start 3G is above --stop 2G: the new sweep must ascend$'
+message=$("$tool" snp resample "$example" --start 2G --stop 2G --points 3 -o "$work/e.s2p" 2>&1) &&
+  fail "three points at one frequency were accepted"
+expect_line "$message" '^lumenutil: --start and --stop are equal: 3 points need --stop above --start$'
+"$tool" snp resample "$example" --start 2G --stop 2G --points 1 -o "$work/one.s2p" ||
+  fail "one point at one frequency was refused"
+"$tool" snp resample --help | grep -q '1 to 10000000' || fail "--help does not state the point limit"
 "$tool" snp resample "$example" --start 2G --stop 3G --points 3 -o "$work/x.s4p" 2>/dev/null &&
   fail "a two-port network was written to a .s4p file"
 exit $((failures > 0))

@@ -17,6 +17,10 @@
 #include "lumen/data/snp_types.h"
 #include "lumen/export.h"
 
+namespace LumenUtility {
+class TouchstoneParser;
+}
+
 // Facts about the last file read successfully, beyond its traces.
 struct SnPFileInfo {
   int version = 0;                   // 1 or 2; 0 before the first successful read
@@ -25,10 +29,14 @@ struct SnPFileInfo {
   char parameter = 'S';              // S, Y, Z, H or G as the option line names it
   ESNPForm form = SNP_MA;
   double referenceResistance = 50.0;   // ohms, the option line's R
+  bool referenceResistanceGiven = false;  // the option line gave R a value
   std::vector<double> portReferences;  // ohms per port from [Reference]; empty without it
   SnPMatrixFormat matrixFormat = SNP_MATRIX_FULL;
   int declaredFrequencies = 0;  // [Number of Frequencies]; 0 when absent
   int noisePoints = 0;          // noise records read (two-port files only)
+  bool extraPointsIgnored = false;  // network data went on past [Number of Frequencies]
+  std::vector<std::string> ignoredOptions;  // option-line tokens not understood, upper case
+  std::vector<int> pointLines;  // line of each network point's stimulus value, from 1
 };
 
 class LUMEN_API CSnPFileBase : public CSNParameterS {
@@ -44,7 +52,13 @@ class LUMEN_API CSnPFileBase : public CSNParameterS {
   // object's port count; a version 2 file's [Number of Ports] replaces it. Returns the
   // number of stimulus points of network data read, or -1 when the file cannot be opened or
   // is malformed (GetReadError then says what and where).
+  // The file is read in chunks as it is parsed, so memory stays within what the traces need
+  // plus about 2 MiB, and text that is not Touchstone is refused at its first lines
+  // whatever its size. A line or value longer than 1 MiB is refused.
   int ReadSNPFile(const std::wstring& path);
+  // The same for an open descriptor (a pipe, a device, standard input), read to its end in
+  // chunks; the descriptor stays open.
+  int ReadSNPDescriptor(int fd);
   // The same for file contents already in memory.
   int ReadSNPText(std::string_view text);
 
@@ -68,12 +82,19 @@ class LUMEN_API CSnPFileBase : public CSNParameterS {
   void SetResultType(ResultType type) { m_resultType = type; }
 
  private:
+  // Stores what `parser` reads; the object stays as it was when that fails.
+  int ReadParsed(LumenUtility::TouchstoneParser& parser);
+
   int m_constructedPorts;
   SweepTypeEnum m_sweepType = SWEEP_UNSPECIFIED;
   ResultType m_resultType = RESULT_FREQUENCY;
   SnPFileInfo m_info;
   std::wstring m_readError;
 };
+
+// The unit an option-line stimulus token stands for, as people write it: L"GHz" for "GHZ",
+// L"s" for "SEC", L"dBm" for "DBM", L"point numbers" for "POINT"; the token itself otherwise.
+LUMEN_API std::wstring SnPUnitName(const std::string& unitToken);
 
 // The port count a file name implies: N of an ".sNp" extension (any case), or -1 when the
 // name has no such extension or N is outside 1..999.
