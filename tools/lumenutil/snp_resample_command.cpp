@@ -9,6 +9,7 @@
 #include "lumenutil/snp_command_io.h"
 #include "lumenutil/snp_commands.h"
 #include "lumenutil/snp_file.h"
+#include "lumenutil/trace_carrier.h"
 #include "lumenutil/touchstone_writer.h"
 
 using LumenUtility::InputArray;
@@ -75,8 +76,7 @@ void Resample(const ResampleOptions& options) {
                              WithUnit(s11.GetStopFreq(), axis.unit, axis.siPrefix) +
                              "; --hold-ends extends each trace with its end values");
   }
-  if (options.holdEnds) file.ExtroplateReadSNPFile(target);
-  file.InterpolateReadSNPFile(target, true);
+  CarryOnto(file, target, options.holdEnds);
 
   const std::string comment =
       "Resampled by lumenutil from " + options.path + " onto " + std::to_string(options.points) +

@@ -92,4 +92,18 @@ expect_line "$message" '^lumenutil: --start and --stop are equal: 3 points need 
 "$tool" snp resample --help | grep -q '1 to 10000000' || fail "--help does not state the point limit"
 "$tool" snp resample "$example" --start 2G --stop 3G --points 3 -o "$work/x.s4p" 2>/dev/null &&
   fail "a two-port network was written to a .s4p file"
+
+# Stimulus steps far below one unit (a time-domain file in seconds, 1 ns apart) are
+# interpolated, not copied from a neighbour within 0.1 s: the unit circle at 0, 90 and 180
+# degrees gives 45 degrees halfway between the first two points.
+printf '# SEC S RI R 50
+0 1 0
+1e-9 0 1
+2e-9 -1 0
+' >"$work/time.s1p"
+"$tool" snp resample "$work/time.s1p" --start 0.5e-9 --stop 1.5e-9 --points 2 -o "$work/time_out.s1p" ||
+  fail "resampling a time-domain file failed"
+halfway=$("$tool" snp export "$work/time_out.s1p" -f ma -n 1 | tail -n 1)
+[[ $halfway =~ ^5e-10,(0\.99999|1)[0-9]*,(44\.9999|45)[0-9.]*$ ]] ||
+  fail "halfway in a time-domain file reads $halfway, not magnitude 1 at 45 degrees"
 exit $((failures > 0))

@@ -67,7 +67,10 @@ class LUMEN_API CSnPFileBase : public CSNParameterS {
   const std::wstring& GetReadError() const { return m_readError; }
   const SnPFileInfo& GetFileInfo() const { return m_info; }
 
-  // Interpolate(stimulus, reset) on every matrix trace; the noise traces stay as read.
+  // Interpolate(stimulus, reset) on every matrix trace; the noise traces stay as read. A new
+  // point within 0.1 stimulus units of an old one takes the old value (right for Hz): a
+  // caller whose steps are near or below one unit (seconds, dBm) scales both stimuli first,
+  // for example into picoseconds, so that 0.1 of the unit is far below a step.
   void InterpolateReadSNPFile(const LumenUtility::InputArray& stimulus, bool reset);
   // Widens every matrix trace that does not cover the range of `stimulus`: a point at the
   // target's lowest value is put before the trace's first point, holding that point's value,

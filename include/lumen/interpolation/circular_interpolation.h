@@ -9,8 +9,12 @@
 // (linearly) and phase (along the shorter turn). A second pass can replace the phase of every
 // point by a blend of local quadratic fits of the unwrapped phase.
 //
-// Stimulus values are in the caller's unit (Hz, dBm, s) and may come in any order; output
-// point k always belongs to new stimulus point k. All functions are stateless and reentrant;
+// The 0.1 tolerance is in stimulus units and suits frequencies in Hz; a caller whose steps are
+// near or below one unit (time in seconds, power in dBm) must scale both stimuli into a
+// smaller unit (ps, millidecibels) first, or neighbouring points are copied, not
+// interpolated. Stimulus values are in the caller's unit (Hz, dBm, s) and may come in any
+// order; output point k always belongs to new stimulus point k. All functions are stateless
+// and reentrant;
 // the arrays must not change during a call. `interpolated` may be null; otherwise it receives
 // true when at least one output point was computed rather than copied from an old point.
 #pragma once
