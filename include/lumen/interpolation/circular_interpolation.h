@@ -14,9 +14,9 @@
 // smaller unit (ps, millidecibels) first, or neighbouring points are copied, not
 // interpolated. Stimulus values are in the caller's unit (Hz, dBm, s) and may come in any
 // order; output point k always belongs to new stimulus point k. All functions are stateless
-// and reentrant;
-// the arrays must not change during a call. `interpolated` may be null; otherwise it receives
-// true when at least one output point was computed rather than copied from an old point.
+// and reentrant; the arrays must not change during a call. `interpolated` may be null;
+// otherwise it receives true when at least one output point was computed rather than copied
+// from an old point.
 #pragma once
 
 #include <cstdint>
