@@ -13,6 +13,7 @@
 #include <string>
 
 #include "data/touchstone_parser.h"
+#include "lumen/data/snp_trace_names.h"
 #include "lumen/platform/text_conversion.h"
 
 using LumenUtility::InputArray;
@@ -46,13 +47,6 @@ int TriangleIndex(SnPMatrixFormat format, int n, int row, int column) {
   }
   return row <= column ? (row - 1) * n - row * (row - 1) / 2 + column - 1
                        : (column - 1) * n - column * (column - 1) / 2 + row - 1;
-}
-
-std::wstring TraceName(const wchar_t* prefix, int row, int column) {
-  wchar_t name[64];
-  std::swprintf(name, 64, row < 10 && column < 10 ? L"%lsS%d%d" : L"%lsS%d_%d", prefix, row,
-                column);
-  return name;
 }
 
 }  // namespace
@@ -148,7 +142,7 @@ int CSnPFileBase::ReadParsed(LumenUtility::TouchstoneParser& parser) {
     // Named after the matrix position the trace lands in (for a two-port file in 11, 21,
     // 12, 22 order the second pair read is S21).
     const int position = LoopIndex(k);
-    trace.SetName(TraceName(prefix, position / n + 1, position % n + 1));
+    trace.SetName(prefix + LumenUtility::Utf8ToWide(SnPTraceName(position / n + 1, position % n + 1)));
     GetLoopParam(k) = std::move(trace);
   }
   return static_cast<int>(points);

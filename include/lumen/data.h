@@ -6,4 +6,5 @@
 #include "lumen/data/sn_parameter.h"
 #include "lumen/data/sn_parameter_s.h"
 #include "lumen/data/snp_file_base.h"
+#include "lumen/data/snp_trace_names.h"
 #include "lumen/data/snp_types.h"

@@ -83,38 +83,18 @@ void RequireAscendingStimulus(const CSnPFileBase& file, const std::string& path)
 
 namespace {
 
-std::string PositionName(int row, int column) {
-  char name[32];
-  std::snprintf(name, sizeof name, row < 10 && column < 10 ? "S%d%d" : "S%d_%d", row, column);
-  return name;
-}
-
-bool ReadIndex(const std::string& text, int& value) {
-  const char* end = text.data() + text.size();
-  const std::from_chars_result r = std::from_chars(text.data(), end, value);
-  return !text.empty() && r.ec == std::errc() && r.ptr == end;
-}
-
 MatrixPosition ParsePosition(const std::string& text, int ports) {
   const auto fail = [&](const std::string& why) {
     return std::runtime_error("'" + text + "' " + why);
   };
-  if (text.size() < 3 || (text[0] != 'S' && text[0] != 's')) {
+  int row = 0, column = 0;
+  if (!SnPParseTraceName(text, row, column)) {
     throw fail("is not a parameter name such as S21 or S1_10");
   }
-  const std::string indices = text.substr(1);
-  const std::size_t separator = indices.find('_');
-  int row = 0, column = 0;
-  const bool read = separator == std::string::npos
-                        ? indices.size() == 2 && ReadIndex(indices.substr(0, 1), row) &&
-                              ReadIndex(indices.substr(1), column)
-                        : ReadIndex(indices.substr(0, separator), row) &&
-                              ReadIndex(indices.substr(separator + 1), column);
-  if (!read) throw fail("is not a parameter name such as S21 or S1_10");
   if (row < 1 || column < 1 || row > ports || column > ports) {
     throw fail("is not a parameter of a " + std::to_string(ports) + "-port network");
   }
-  return {row, column, PositionName(row, column)};
+  return {row, column, SnPTraceName(row, column)};
 }
 
 }  // namespace
@@ -126,7 +106,7 @@ std::vector<MatrixPosition> SelectPositions(const std::string& list, const CSnPF
     for (int k = 0; k < n * n; ++k) {
       const int index = static_cast<int>(&file.GetLoopParam(k) - &file.GetParam(SNP_S11));
       positions.push_back(
-          {index / n + 1, index % n + 1, PositionName(index / n + 1, index % n + 1)});
+          {index / n + 1, index % n + 1, SnPTraceName(index / n + 1, index % n + 1)});
     }
     return positions;
   }
@@ -141,7 +121,7 @@ std::vector<MatrixPosition> SelectPositions(const std::string& list, const CSnPF
 
 const CSNParameter& TraceAt(const CSnPFileBase& file, const MatrixPosition& position) {
   const int n = file.GetSNPType();
-  return file.GetParam(static_cast<ESNParam>((position.row - 1) * n + position.column - 1));
+  return file.GetParam(static_cast<ESNParam>(SnPMatrixIndex(n, position.row, position.column)));
 }
 
 std::string Shortest(double value) {
