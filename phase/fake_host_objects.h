@@ -74,12 +74,15 @@ class FakeTestSet final : public ITestSet {
   int classifyCalls = 0;
 };
 
+// Records every run written; throws std::runtime_error instead while `failing`.
 class FakeFifo final : public AI_IFIFO {
  public:
   void Write(const TsComplex* values, int count) override {
+    if (failing) throw std::runtime_error("fifo full");
     writes.emplace_back(values, values + count);
   }
   std::vector<std::vector<TsComplex>> writes;
+  bool failing = false;
 };
 
 inline FakeTestSet& TheTestSet() {
@@ -128,7 +131,7 @@ class PhaseHostTest : public testing::Test {
  protected:
   void SetUp() override {
     TheTestSet().Reset();
-    TheFifo().writes.clear();
+    TheFifo() = FakeFifo();
     RegisterFakes();
   }
   FakeTestSet& testSet() { return TheTestSet(); }
