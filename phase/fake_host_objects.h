@@ -17,6 +17,7 @@
 
 #include "lumen/core/ts_complex.h"
 #include "lumen/phase/pa_component.h"
+#include "lumen/platform/lumen_exception.h"
 #include "lumen/util/host_interfaces.h"
 #include "lumen/util/host_object.h"
 
@@ -137,6 +138,18 @@ class PhaseHostTest : public testing::Test {
   FakeTestSet& testSet() { return TheTestSet(); }
   FakeFifo& fifo() { return TheFifo(); }
 };
+
+// Expects `call` to throw LumenException with exactly `code` and `message`.
+template <class Call>
+void ExpectLumenError(Call&& call, HRESULT code, const std::wstring& message) {
+  try {
+    call();
+    ADD_FAILURE() << "no exception";
+  } catch (const LumenException& e) {
+    EXPECT_EQ(e.GetCode(), code);
+    EXPECT_EQ(e.GetMessage(), message);
+  }
+}
 
 // One point buffer of the fake layout, every value distinct unless given.
 inline std::vector<TsComplex> PointBuffer(float seed = 1.0f) {

@@ -4,7 +4,6 @@
 #include <vector>
 
 #include "lumen/phase/pa_component.h"
-#include "lumen/platform/lumen_exception.h"
 #include "phase/fake_host_objects.h"
 
 namespace phase_test {
@@ -66,13 +65,8 @@ TEST_F(FifoTest, MissingOrFailingFifoLosesNoValue) {
     const HostObjectsMissing missing;
     LumenUtility::RegisterHostObject<ITestSet>(LumenUtility::kHostCategoryApplication, 0,
                                                &testSet());
-    try {
-      component.PutData(points.data(), 2, kPointSize, false, true);
-      ADD_FAILURE() << "no exception";
-    } catch (const LumenException& e) {
-      EXPECT_EQ(e.GetCode(), LumenUtility::E_POINTER);
-      EXPECT_EQ(e.GetMessage(), L"no FIFO is registered");
-    }
+    ExpectLumenError([&] { component.PutData(points.data(), 2, kPointSize, false, true); },
+                     LumenUtility::E_POINTER, L"no FIFO is registered");
   }
   fifo().failing = true;
   EXPECT_THROW(component.PutData(points.data(), 2, kPointSize, false, true), std::runtime_error);

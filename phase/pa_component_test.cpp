@@ -6,7 +6,6 @@
 #include <random>
 #include <vector>
 
-#include "lumen/platform/lumen_exception.h"
 #include "phase/fake_host_objects.h"
 #include "phase/stitch_sweep.h"
 
@@ -194,22 +193,12 @@ TEST_F(ComponentTest, MissingTestSetOrNegativeSizeChangeNothing) {
   const std::vector<TsComplex> before = point;
   {
     const HostObjectsMissing missing;
-    try {
-      component.PutData(point.data(), 1, kPointSize, false, false);
-      ADD_FAILURE() << "no exception";
-    } catch (const LumenException& e) {
-      EXPECT_EQ(e.GetCode(), LumenUtility::E_POINTER);
-      EXPECT_EQ(e.GetMessage(), L"no test set is registered");
-    }
+    ExpectLumenError([&] { component.PutData(point.data(), 1, kPointSize, false, false); },
+                     LumenUtility::E_POINTER, L"no test set is registered");
   }
   EXPECT_EQ(point, before);  // not even substituted
-  try {
-    component.SetSweepParameters(-1, false, 1);
-    ADD_FAILURE() << "no exception";
-  } catch (const LumenException& e) {
-    EXPECT_EQ(e.GetCode(), LumenUtility::E_INVALIDARG);
-    EXPECT_EQ(e.GetMessage(), L"negative number of points");
-  }
+  ExpectLumenError([&] { component.SetSweepParameters(-1, false, 1); },
+                   LumenUtility::E_INVALIDARG, L"negative number of points");
   EXPECT_EQ(component.GetDataByRef(plain).size(), 3u);
   component.PutData(nullptr, 1, kPointSize, false, false);
   component.PutData(point.data(), 1, kPointSize, false, false);

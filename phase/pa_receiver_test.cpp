@@ -3,7 +3,6 @@
 #include <gtest/gtest.h>
 
 #include "lumen/phase/pa_parameter.h"
-#include "lumen/platform/lumen_exception.h"
 #include "phase/fake_host_objects.h"
 
 namespace phase_test {
@@ -44,13 +43,7 @@ TEST_F(ReceiverTest, MissingTestSetIsAPointerError) {
   const HostObjectsMissing missing;
   for (const auto& call : {+[] { PAReceiver(true, 1).ToSlot(false); },
                            +[] { PAReceiver(1, false); }, +[] { PAParameter().PortCount(); }}) {
-    try {
-      call();
-      ADD_FAILURE() << "no exception";
-    } catch (const LumenException& e) {
-      EXPECT_EQ(e.GetCode(), LumenUtility::E_POINTER);
-      EXPECT_EQ(e.GetMessage(), L"no test set is registered");
-    }
+    ExpectLumenError(call, LumenUtility::E_POINTER, L"no test set is registered");
   }
   EXPECT_EQ(PAReceiver(-1, false), PAReceiver(false, -1));  // asks nothing, so still works
 }
