@@ -26,19 +26,6 @@ TEST_F(ReceiverTest, ClassifiesReceiverNumbersThroughTheTestSet) {
   EXPECT_EQ(PAReceiver(25, true), PAReceiver(false, 0));  // test index 0 is a test receiver
 }
 
-TEST_F(ReceiverTest, ReferenceReceiversSortFirstThenByIndex) {
-  EXPECT_TRUE(PAReceiver(true, 4) < PAReceiver(false, 1));
-  EXPECT_FALSE(PAReceiver(false, 1) < PAReceiver(true, 4));
-  EXPECT_TRUE(PAReceiver(false, -1) < PAReceiver(false, 0));
-  EXPECT_FALSE(PAReceiver(true, 2) < PAReceiver(true, 2));
-}
-
-TEST_F(ReceiverTest, SlotsComeFromTheTestSetWithTheMappingFlag) {
-  EXPECT_EQ(PAReceiver(true, 2).ToSlot(false), 1);
-  EXPECT_EQ(PAReceiver(false, 2).ToSlot(false), 5);
-  EXPECT_EQ(PAReceiver(false, 2).ToSlot(true), 2);
-}
-
 TEST_F(ReceiverTest, MissingTestSetIsAPointerError) {
   const HostObjectsMissing missing;
   for (const auto& call : {+[] { PAReceiver(true, 1).ToSlot(false); },
