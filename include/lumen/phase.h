@@ -1,0 +1,9 @@
+// Phase-coherent acquisition: receivers and ratio parameters, phase stitching across band
+// breaks, and the component that collects, averages and streams the data of a sweep.
+#pragma once
+
+#include "lumen/phase/pa_component.h"
+#include "lumen/phase/pa_parameter.h"
+#include "lumen/phase/pa_parameter_record.h"
+#include "lumen/phase/pa_receiver.h"
+#include "lumen/phase/stitch_phase.h"
