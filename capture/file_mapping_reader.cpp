@@ -22,7 +22,8 @@ FileMappingReader::FileMappingReader(const std::wstring& name) : m_pView(nullptr
   struct stat status {};
   int error = fstat(fd, &status) == 0 ? 0 : errno;
   if (error == 0 && status.st_size > 0) {
-    void* view = mmap(nullptr, static_cast<std::size_t>(status.st_size), PROT_READ, MAP_SHARED, fd, 0);
+    void* view =
+        mmap(nullptr, static_cast<std::size_t>(status.st_size), PROT_READ, MAP_SHARED, fd, 0);
     if (view == MAP_FAILED) {
       error = errno;
     } else {

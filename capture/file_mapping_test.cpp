@@ -112,7 +112,8 @@ TEST(FileMapping, MemoryBeyondWhatIsLeftIsRefusedUpFront) {
   // Only where the shared-memory file system states a smaller limit: then the reservation
   // fails at once instead of taking the machine's memory.
   if (statvfs("/dev/shm", &fs) != 0 || fs.f_blocks == 0 ||
-      static_cast<std::int64_t>(fs.f_blocks) * static_cast<std::int64_t>(fs.f_frsize) >= oneTerabyte) {
+      static_cast<std::int64_t>(fs.f_blocks) * static_cast<std::int64_t>(fs.f_frsize) >=
+          oneTerabyte) {
     GTEST_SKIP() << "no size limit on /dev/shm below 1 TB";
   }
   const std::wstring name = UniqueBlockName("too-large");

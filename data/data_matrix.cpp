@@ -166,7 +166,8 @@ bool DataMatrix::GetDataByName(const wchar_t* name, std::vector<TsComplex>& out,
                                int stop) const {
   stop = ResolveStop(stop);
   const std::wstring key = LookupAlias(NameOf(name));
-  if (const NamedBuffer* buffer = FindBuffer(key)) return CopyRange(buffer->m_data, out, start, stop);
+  if (const NamedBuffer* buffer = FindBuffer(key))
+    return CopyRange(buffer->m_data, out, start, stop);
 
   const std::size_t slash = key.find(L'/');
   const std::size_t comma = key.find(L',');
@@ -194,8 +195,8 @@ bool DataMatrix::GetPointerToDataByName(const wchar_t* name,
   return true;
 }
 
-bool DataMatrix::GetDataByAuxName(const wchar_t* auxName, std::vector<TsComplex>& out,
-                                  int start, int stop) const {
+bool DataMatrix::GetDataByAuxName(const wchar_t* auxName, std::vector<TsComplex>& out, int start,
+                                  int stop) const {
   const std::wstring wanted = NameOf(auxName);
   const auto found = std::find_if(m_buffers.begin(), m_buffers.end(), [&wanted](const auto& entry) {
     return entry.second.m_auxName == wanted;

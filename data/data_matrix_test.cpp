@@ -115,7 +115,8 @@ TEST(DataMatrix, WholeBufferCallsReplaceTheOutputAndPartialOnesKeepTheRest) {
 
   Samples out(5, TsComplex(-1, -1));
   ASSERT_TRUE(m.GetDataByPhysicalPort(2, 1, out, 1, 3));
-  EXPECT_EQ(out, (Samples{TsComplex(-1, -1), s21[1], s21[2], TsComplex(-1, -1), TsComplex(-1, -1)}));
+  EXPECT_EQ(out,
+            (Samples{TsComplex(-1, -1), s21[1], s21[2], TsComplex(-1, -1), TsComplex(-1, -1)}));
   ASSERT_TRUE(m.GetDataByPhysicalPort(2, 1, out, 2, -1));
   EXPECT_EQ(out[3], s21[3]);
 
@@ -246,7 +247,8 @@ TEST(DataMatrix, RatioNameDividesNumeratorByDenominatorSampleBySample) {
     if (k == 17) continue;
     // Single-precision arithmetic: within a few float roundings of the exact quotient.
     const std::complex<double> want = Expected(a[k], r[k]);
-    EXPECT_LE(std::abs(std::complex<double>(q[k].re, q[k].im) - want), 1e-5 * std::abs(want) + 1e-30)
+    EXPECT_LE(std::abs(std::complex<double>(q[k].re, q[k].im) - want),
+              1e-5 * std::abs(want) + 1e-30)
         << k;
   }
   EXPECT_EQ(q[17], TsComplex(0, 0));  // a zero denominator sample gives 0 + 0j, not NaN

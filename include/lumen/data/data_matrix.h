@@ -122,8 +122,7 @@ class LUMEN_API DataMatrix {
   // The target of `name` when it is an alias, else `name`.
   std::wstring LookupAlias(const std::wstring& name) const;
   // The buffer sparameter(i, j) with the numbers as given, without a port check.
-  bool GetDataByLogicalPort(int i, int j, std::vector<TsComplex>& out, int start,
-                            int stop) const;
+  bool GetDataByLogicalPort(int i, int j, std::vector<TsComplex>& out, int start, int stop) const;
 
   const NamedBuffer* FindBuffer(const std::wstring& name) const;
   const NamedBuffer* FindPhysical(int a, int b) const;
@@ -131,9 +130,8 @@ class LUMEN_API DataMatrix {
   bool WithinBufferSize(int start, int stop) const;
   bool CopyRange(const std::vector<TsComplex>& samples, std::vector<TsComplex>& out, int start,
                  int stop) const;
-  bool CopyRatio(const std::vector<TsComplex>& numerator,
-                 const std::vector<TsComplex>& denominator, std::vector<TsComplex>& out,
-                 int start, int stop) const;
+  bool CopyRatio(const std::vector<TsComplex>& numerator, const std::vector<TsComplex>& denominator,
+                 std::vector<TsComplex>& out, int start, int stop) const;
 
   std::map<std::wstring, NamedBuffer> m_buffers;
   std::map<std::wstring, std::wstring> m_aliases;
