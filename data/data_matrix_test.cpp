@@ -10,21 +10,14 @@
 #include <vector>
 
 #include "lumen/platform/lumen_exception.h"
+#include "platform/caught_lumen.h"
 
 namespace LumenUtility {
 namespace {
 
 using Samples = std::vector<TsComplex>;
 
-template <typename F>
-std::pair<HRESULT, std::wstring> CaughtLumen(F f) {
-  try {
-    f();
-  } catch (const LumenException& e) {
-    return {e.GetCode(), e.GetMessage()};
-  }
-  return {S_OK, L"nothing thrown"};
-}
+using testutil::CaughtLumen;
 
 // Samples k + base + (k - base) j, distinct for every buffer that gets its own base.
 Samples Ramp(int n, float base) {
