@@ -8,20 +8,12 @@
 #include <stdexcept>
 
 #include "lumen/platform/lumen_exception.h"
+#include "platform/caught_lumen.h"
 
 namespace LumenUtility {
 namespace {
 
-// Runs `f` and returns the code and first message of the LumenException it throws.
-template <typename F>
-std::pair<HRESULT, std::wstring> CaughtLumen(F f) {
-  try {
-    f();
-  } catch (const LumenException& e) {
-    return {e.GetCode(), e.GetMessage()};
-  }
-  return {S_OK, L"nothing thrown"};
-}
+using testutil::CaughtLumen;
 
 TEST(Segment, ConstructionNormalisesTypeAndCountAndExtremesFollowThePoints) {
   const Segment single(1e9, 2e9, 1, Linear);

@@ -1,8 +1,10 @@
-// Measurement data containers and files: error-term names, Touchstone traces and their
-// reader.
+// Measurement data containers and files: named sample buffers and their matrix, error-term
+// names, Touchstone traces and their reader.
 #pragma once
 
+#include "lumen/data/data_matrix.h"
 #include "lumen/data/eterm_names.h"
+#include "lumen/data/named_buffer.h"
 #include "lumen/data/sn_parameter.h"
 #include "lumen/data/sn_parameter_s.h"
 #include "lumen/data/snp_file_base.h"

@@ -14,4 +14,7 @@ void AddHResultCommand(CLI::App& app);
 // Adds `snp` and its commands on Touchstone files.
 void AddSnpCommand(CLI::App& app);
 
+// Adds `capture read NAME`: the floats of a data capture block.
+void AddCaptureCommand(CLI::App& app);
+
 }  // namespace lumenutil
