@@ -49,7 +49,8 @@ IniDocument IniDocument::Parse(std::wstring_view text) {
     const std::size_t end = text.find(L'\n');
     std::wstring_view line = text.substr(0, end);
     text.remove_prefix(end == npos ? text.size() : end + 1);
-    if (!line.empty() && line.back() == L'\r' && end != npos) line.remove_suffix(1);
+    // Every CR at the end goes: a stray one would turn into a line end once rewritten.
+    while (!line.empty() && line.back() == L'\r') line.remove_suffix(1);
     document.m_lines.push_back(ParseLine(line, inSection));
     inSection = inSection || document.m_lines.back().isHeader;
   }

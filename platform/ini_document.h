@@ -19,8 +19,8 @@ namespace LumenUtility {
 
 class IniDocument {
  public:
-  // Splits `text` into lines at LF, dropping a CR before the LF and a byte-order mark at the
-  // very start. Never fails: every text is a document.
+  // Splits `text` into lines at LF, dropping CRs at the end of each line and a byte-order
+  // mark at the very start. Never fails: every text is a document.
   static IniDocument Parse(std::wstring_view text);
 
   // The value of `entry` in `section`, if the document has one.

@@ -52,6 +52,10 @@ TEST(IniDocument, SetChangesTheEntryInPlaceAndKeepsEveryOtherLine) {
             L"; settings\n[Debug]\nDEBUG PRINT=0101\n; keep me\nDebug Print File=1\n"
             L"Debug Print Filename=out.txt\n\n[Next]\nx=1\n\n[New]\na=b\n");
   EXPECT_EQ(IniDocument::Parse(document.Text()).Text(), document.Text());
+  // Carriage returns at line ends, doubled or before the end of the text, are line ends too.
+  const IniDocument crs = IniDocument::Parse(L"[a]\r\r\nk=v\r\r\nx=1\ry\r");
+  EXPECT_EQ(crs.Text(), L"[a]\nk=v\nx=1\ry\n");
+  EXPECT_EQ(crs.Find(L"a", L"k"), L"v");
 }
 
 TEST(IniDocument, ValuesComeBackAsTheyWereSet) {
