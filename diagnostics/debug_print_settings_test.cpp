@@ -16,13 +16,7 @@ namespace {
 
 using LumenUtility::IniProfileStore;
 using LumenUtility::testutil::TempDir;
-
-std::string FileText(const std::string& path) {
-  std::ifstream in(path, std::ios::binary);
-  std::stringstream text;
-  text << in.rdbuf();
-  return text.str();
-}
+using LumenUtility::testutil::FileText;
 
 struct QuietDebugger : LumenUtility::IDebugOutputSink {
   void Output(const wchar_t*) override {}

@@ -4,7 +4,6 @@
 
 #include <filesystem>
 #include <fstream>
-#include <sstream>
 #include <string>
 #include <vector>
 
@@ -15,13 +14,7 @@
 namespace {
 
 using LumenUtility::testutil::TempDir;
-
-std::string FileText(const std::string& path) {
-  std::ifstream in(path, std::ios::binary);
-  std::stringstream text;
-  text << in.rdbuf();
-  return text.str();
-}
+using LumenUtility::testutil::FileText;
 
 // Collects what the debugger and console devices are given, in order.
 struct DeviceLog : LumenUtility::IDebugOutputSink, ConsoleDPrint {

@@ -14,10 +14,13 @@
 #include "lumen/platform/memory_trace_sink.h"
 #include "lumen/platform/text_conversion.h"
 #include "platform/temp_dir.h"
+#include "platform/trace_test_bytes.h"
 
 namespace {
 
 using namespace LumenUtility;
+using LumenUtility::testutil::Int32Bytes;
+using LumenUtility::testutil::TextBytes;
 
 // Every test starts and ends without a tracing object.
 class TPrintTest : public testing::Test {
@@ -39,17 +42,6 @@ class TPrintTest : public testing::Test {
   MemoryTraceSink m_sink;
   std::unique_ptr<TraceSession> m_session;
 };
-
-std::vector<std::uint8_t> Int32Bytes(std::int32_t v) {
-  const auto u = static_cast<std::uint32_t>(v);
-  return {static_cast<std::uint8_t>(u), static_cast<std::uint8_t>(u >> 8),
-          static_cast<std::uint8_t>(u >> 16), static_cast<std::uint8_t>(u >> 24)};
-}
-
-std::vector<std::uint8_t> TextBytes(const std::wstring& text) {
-  const std::string bytes = WideToUtf16LeBytes(text) + std::string(2, '\0');
-  return {bytes.begin(), bytes.end()};
-}
 
 TEST_F(TPrintTest, NothingIsWrittenUntilInitEnableAndASessionAllAgree) {
   EXPECT_FALSE(IsTPrintEnabled());

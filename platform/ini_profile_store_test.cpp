@@ -5,7 +5,6 @@
 
 #include <filesystem>
 #include <fstream>
-#include <sstream>
 #include <string>
 
 #include "platform/temp_dir.h"
@@ -14,13 +13,7 @@ namespace {
 
 using LumenUtility::IniProfileStore;
 using LumenUtility::testutil::TempDir;
-
-std::string FileText(const std::string& path) {
-  std::ifstream in(path, std::ios::binary);
-  std::stringstream text;
-  text << in.rdbuf();
-  return text.str();
-}
+using LumenUtility::testutil::FileText;
 
 TEST(IniProfileStore, KeepsEntriesInMemoryUntilAPathIsSet) {
   IniProfileStore store;

@@ -11,10 +11,13 @@
 
 #include "lumen/platform/text_conversion.h"
 #include "platform/temp_dir.h"
+#include "platform/trace_test_bytes.h"
 
 namespace {
 
 using namespace LumenUtility;
+using LumenUtility::testutil::Int32Bytes;
+using LumenUtility::testutil::TextBytes;
 using boost::property_tree::ptree;
 using LumenUtility::testutil::TempDir;
 
@@ -34,17 +37,6 @@ TraceRecord Record(std::uint16_t id, std::uint64_t keyword,
                    std::vector<std::vector<std::uint8_t>> items, std::int64_t ns = 1234567) {
   return TraceRecord{kProvider, EVENT_DESCRIPTOR{id, 1, 16, 16, 10, 1, keyword}, ns, 10, 20,
                      std::move(items)};
-}
-
-std::vector<std::uint8_t> Int32Bytes(std::int32_t v) {
-  const auto u = static_cast<std::uint32_t>(v);
-  return {static_cast<std::uint8_t>(u), static_cast<std::uint8_t>(u >> 8),
-          static_cast<std::uint8_t>(u >> 16), static_cast<std::uint8_t>(u >> 24)};
-}
-
-std::vector<std::uint8_t> TextBytes(const std::wstring& text) {
-  const std::string bytes = WideToUtf16LeBytes(text) + std::string(2, '\0');
-  return {bytes.begin(), bytes.end()};
 }
 
 ptree ReadJson(const std::string& path) {
