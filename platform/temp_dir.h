@@ -1,8 +1,11 @@
-// A scratch directory for file tests, removed with everything in it when the test ends.
+// A scratch directory for file tests, removed with everything in it when the test ends, and
+// the reading of a whole file.
 #pragma once
 
 #include <cstdlib>
 #include <filesystem>
+#include <fstream>
+#include <sstream>
 #include <string>
 
 namespace LumenUtility::testutil {
@@ -24,5 +27,13 @@ class TempDir {
  private:
   std::filesystem::path m_path;
 };
+
+// The whole content of the file at `path`; empty when it cannot be read.
+inline std::string FileText(const std::string& path) {
+  std::ifstream in(path, std::ios::binary);
+  std::stringstream text;
+  text << in.rdbuf();
+  return text.str();
+}
 
 }  // namespace LumenUtility::testutil

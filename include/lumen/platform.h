@@ -1,4 +1,5 @@
-// Platform base: result codes, the library exception and text conversions.
+// Platform base: result codes, the library exception, text conversions, files and archives,
+// and the stand-ins for the host's profile, debugger output, sound and event tracing.
 #pragma once
 
 #include "lumen/export.h"
@@ -7,3 +8,12 @@
 #include "lumen/platform/text_conversion.h"
 #include "lumen/platform/archive.h"
 #include "lumen/platform/file.h"
+#include "lumen/platform/beep.h"
+#include "lumen/platform/debug_output.h"
+#include "lumen/platform/event_trace.h"
+#include "lumen/platform/ini_profile_store.h"
+#include "lumen/platform/json_trace_file_sink.h"
+#include "lumen/platform/memory_trace_sink.h"
+#include "lumen/platform/profile_store.h"
+#include "lumen/platform/trace_manifest.h"
+#include "lumen/platform/trace_session.h"
