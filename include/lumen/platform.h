@@ -7,3 +7,6 @@
 #include "lumen/platform/text_conversion.h"
 #include "lumen/platform/archive.h"
 #include "lumen/platform/file.h"
+#include "lumen/platform/main_window.h"
+#include "lumen/platform/registry.h"
+#include "lumen/platform/rigel.h"
