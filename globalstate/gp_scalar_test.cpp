@@ -4,6 +4,8 @@
 
 #include <boost/make_shared.hpp>
 
+#include <locale>
+
 #include "globalstate/value_type_name.h"
 #include "lumen/globalstate/gp_array.h"
 
@@ -28,6 +30,22 @@ TEST(GPScalar, TextFormsShowTypeNameAndStreamFormattedValue) {
   EXPECT_EQ(text.value_to_string(false), L"External");
   EXPECT_EQ(text.to_string(false),
             L"GPScalar<" + ValueTypeName(typeid(std::wstring)) + L"> RefSel External");
+}
+
+// A locale that writes a decimal comma and groups thousands.
+struct CommaPunct : std::numpunct<wchar_t> {
+  wchar_t do_decimal_point() const override { return L','; }
+  wchar_t do_thousands_sep() const override { return L'.'; }
+  std::string do_grouping() const override { return "\3"; }
+};
+
+TEST(GPScalar, TextFormsIgnoreTheHostsGlobalLocale) {
+  const std::locale before = std::locale::global(std::locale(std::locale::classic(), new CommaPunct));
+  const std::wstring fraction = GPScalar<double>(L"Power", 0.5).value_to_string(false);
+  const std::wstring thousands = GPScalar<std::int32_t>(L"Count", 12345).value_to_string(false);
+  std::locale::global(before);
+  EXPECT_EQ(fraction, L"0.5");
+  EXPECT_EQ(thousands, L"12345");
 }
 
 TEST(GPScalar, IsEqualWantsTheSameNameClassAndValue) {
