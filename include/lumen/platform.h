@@ -1,5 +1,6 @@
 // Platform base: result codes, the library exception, text conversions, files and archives,
-// and the stand-ins for the host's profile, debugger output, sound and event tracing.
+// and the stand-ins for the host's profile, debugger output, sound, event tracing, registry,
+// main window and hardware-interface library.
 #pragma once
 
 #include "lumen/export.h"
@@ -17,3 +18,6 @@
 #include "lumen/platform/profile_store.h"
 #include "lumen/platform/trace_manifest.h"
 #include "lumen/platform/trace_session.h"
+#include "lumen/platform/main_window.h"
+#include "lumen/platform/registry.h"
+#include "lumen/platform/rigel.h"

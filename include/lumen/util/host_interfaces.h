@@ -114,3 +114,16 @@ class ISelectedExternalDevices {
 };
 
 }  // namespace Interface
+
+// The host's channel manager: brackets a change that touches every channel, so that the
+// channels are brought up to date once, when the change ends. Created through the factory
+// under "CHANNELS_MANAGER", whose product is a boost::shared_ptr<IChannelManager>; the library
+// creates it once and keeps it.
+class IChannelManager {
+ public:
+  virtual ~IChannelManager() = default;
+  // Starts a change; the token returned is handed back to EndChange.
+  virtual int BeginChange() = 0;
+  // Ends the change that BeginChange started with `token`.
+  virtual void EndChange(int token) = 0;
+};
