@@ -216,7 +216,7 @@ bool TouchstoneParser::ReadNetworkData() {
     }
     stimulus *= c.info.stimulusMultiplier;
     if (c.ports == 2 && m_noiseMarked && !c.stimulus.empty() && stimulus <= c.stimulus.back()) {
-      return ReadNoiseData(true);
+      return ReadNoiseData(true, stimulus);
     }
     if (!ReadRecordValues(valuesPerPoint, m_scanner.Line(), "data point", c.values)) {
       return false;
@@ -248,10 +248,11 @@ bool TouchstoneParser::ReadDataKeyword(std::string_view token) {
   return Fail("[" + name + "] is not expected among the data");
 }
 
-bool TouchstoneParser::ReadNoiseData(bool firstStimulus) {
+bool TouchstoneParser::ReadNoiseData(bool haveFirst, double first) {
   TouchstoneContent& c = *m_content;
   if (c.ports != 2) return Fail("noise data is only read for two-port networks");
-  bool haveStimulus = firstStimulus;
+  bool haveStimulus = haveFirst;
+  double stimulus = first;
   for (;;) {
     if (!haveStimulus) {
       const std::string_view token = m_scanner.NextValueToken();
@@ -262,16 +263,17 @@ bool TouchstoneParser::ReadNoiseData(bool firstStimulus) {
         if (m_scanner.ReadKeyword(name) && name == "END") return true;
         return Fail(Quote(token) + " is not expected among the noise data");
       }
-      double unused = 0.0;
-      if (!ParseStreamDouble(token, unused)) {
+      if (!ParseStreamDouble(token, stimulus)) {
         return Fail(Quote(token) + " is not a number (a noise stimulus value was expected)");
       }
+      stimulus *= c.info.stimulusMultiplier;
     }
     haveStimulus = false;
     const std::size_t start = c.noise.size();
     if (!ReadRecordValues(4, m_scanner.Line(), "noise record", c.noise)) return false;
     c.noise[start] *= 2.0f;
     c.noise[start + 3] = static_cast<float>(c.noise[start + 3] * c.info.referenceResistance);
+    c.noiseStimulus.push_back(stimulus);
     ++c.info.noisePoints;
   }
 }
