@@ -9,7 +9,7 @@
 #include "lumenutil/snp_command_io.h"
 #include "lumenutil/snp_commands.h"
 #include "lumenutil/snp_file.h"
-#include "lumenutil/touchstone_writer.h"
+#include "lumenutil/touchstone_output.h"
 
 using LumenUtility::InputArray;
 
@@ -45,11 +45,7 @@ void Resample(const ResampleOptions& options) {
   if (options.log && (start <= 0 || stop <= 0)) {
     throw std::runtime_error("a logarithmic sweep needs --start and --stop above 0");
   }
-  const int outputPorts = SnPPortCountFromFileName(LumenUtility::Utf8ToWide(options.output));
-  if (outputPorts > 0 && outputPorts != file.GetSNPType()) {
-    throw std::runtime_error(options.output + " names " + std::to_string(outputPorts) +
-                             " ports, but the network has " + std::to_string(file.GetSNPType()));
-  }
+  CheckOutputPorts(options.output, file);
   const CSNParameter& s11 = file.GetParam(SNP_S11);
   if (s11.GetNumPoints() == 0) throw std::runtime_error(options.path + ": no data points");
   const InputArray target(start, stop, options.points,
@@ -71,8 +67,9 @@ void Resample(const ResampleOptions& options) {
       (options.log ? " logarithmic" : " linear") + " points, " +
       WithUnit(start, axis.unit, axis.siPrefix) + " to " +
       WithUnit(stop, axis.unit, axis.siPrefix) + (options.holdEnds ? ", end values held" : "");
-  WriteOutputFile(options.output,
-                  [&](std::ostream& out) { WriteTouchstoneV1(file, comment, out, std::cerr); });
+  LumenUtility::TouchstoneWriteOptions write;  // version 1, RI, Hz
+  write.comment = comment;
+  WriteTouchstoneFile(file, write, options.output, "snp resample", true);
 }
 
 }  // namespace
