@@ -142,29 +142,22 @@ class Output {
   TouchstoneWriteResult m_result;
 };
 
-const char* StimulusToken(ResultType type, SnPFrequencyUnit unit) {
-  switch (type) {
-    case RESULT_SEC:
-      return "SEC";
-    case RESULT_DBM:
-      return "DBM";
-    case RESULT_POINT:
-      return "POINT";
-    default:
-      return SnPUnitToken(unit);
-  }
-}
+// How the stimulus appears: its option-line token and its unit in messages.
+struct StimulusWords {
+  const char* token;
+  const char* unit;
+};
 
-const char* StimulusUnitName(ResultType type, SnPFrequencyUnit unit) {
+StimulusWords WordsOf(ResultType type, SnPFrequencyUnit unit) {
   switch (type) {
     case RESULT_SEC:
-      return "s";
+      return {"SEC", "s"};
     case RESULT_DBM:
-      return "dBm";
+      return {"DBM", "dBm"};
     case RESULT_POINT:
-      return "";
+      return {"POINT", ""};
     default:
-      return FindUnit(unit)->name;
+      return {FindUnit(unit)->token, FindUnit(unit)->name};
   }
 }
 
@@ -223,7 +216,7 @@ void TouchstoneWriter::CheckNetwork() const {
   const int n = m_file.GetSNPType();
   const CSNParameter& first = m_file.GetParam(SNP_S11);
   const LumenUtility::InputArray& stimulus = first.GetStimulus();
-  const char* unit = StimulusUnitName(m_file.GetResultType(), m_options.unit);
+  const char* unit = WordsOf(m_file.GetResultType(), m_options.unit).unit;
   for (int k = 0; k < n * n; ++k) {
     const CSNParameter& trace = m_file.GetParam(static_cast<ESNParam>(k));
     const std::string name = PositionName(k / n + 1, k % n + 1);
@@ -320,7 +313,7 @@ void TouchstoneWriter::CheckNoise() {
   if (m_reference == 0) Refuse("noise resistances cannot be normalised to a reference of 0 ohm");
   if (m_options.version == 1) {
     const LumenUtility::InputArray& network = m_file.GetParam(SNP_S11).GetStimulus();
-    const char* unit = StimulusUnitName(m_file.GetResultType(), m_options.unit);
+    const char* unit = WordsOf(m_file.GetResultType(), m_options.unit).unit;
     if (network.empty()) {
       Refuse("version 1 noise data must follow network data; this set has no network points");
     }
@@ -352,7 +345,7 @@ TouchstoneWriteResult TouchstoneWriter::Write(std::ostream& stream) const {
     comment.remove_prefix(std::min(end + 1, comment.size()));
   }
   if (v2) out.Line("[Version] 2.0");
-  out.Line(std::string("# ") + StimulusToken(m_file.GetResultType(), m_options.unit) + ' ' +
+  out.Line(std::string("# ") + WordsOf(m_file.GetResultType(), m_options.unit).token + ' ' +
            info.parameter + ' ' + SnPFormToken(m_options.form) + " R " + Number(m_reference));
   if (v2) {
     out.Line("[Number of Ports] " + std::to_string(n));

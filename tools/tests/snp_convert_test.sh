@@ -5,12 +5,6 @@
 # Usage: snp_convert_test.sh LUMENUTIL SOURCE_DIR
 set -uo pipefail
 source "$(dirname "$0")/tool_test_common.sh"
-same_export() {  # same_export A B [export options...]: identical RI tables
-  local a=$1 b=$2
-  shift 2
-  diff <("$tool" snp export "$a" -f ri "$@") <("$tool" snp export "$b" -f ri "$@") >"$work/diff" ||
-    fail "$a and $b differ:"$'\n'"$(head -n 5 "$work/diff")"
-}
 sha() { sha256sum <"$1"; }
 
 # The example is a version 1 DB file in GHz: rewritten as it is and as version 2.0 it reads
