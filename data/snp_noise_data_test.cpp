@@ -10,8 +10,9 @@ namespace {
 
 // Noise records keep their own frequencies, whatever their count against the network points.
 TEST(SnPNoiseData, NoiseTracesLieOnTheFrequenciesOfTheirRecords) {
-  const std::string network = "# MHz S MA R 50\n100 0.5 0 0.1 90 0.2 0 0.4 45\n"
-                              "200 0.6 10 0.3 80 0.2 5 0.5 40\n! Noise Parameters\n";
+  const std::string network =
+      "# MHz S MA R 50\n100 0.5 0 0.1 90 0.2 0 0.4 45\n"
+      "200 0.6 10 0.3 80 0.2 5 0.5 40\n! Noise Parameters\n";
   CSnPFileBase file(2);
   // Fewer records than network points: one trace value per record, none made up.
   ASSERT_EQ(file.ReadSNPText(network + "150 3 0.5 45 0.2\n"), 2);

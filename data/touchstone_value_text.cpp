@@ -24,8 +24,8 @@ constexpr float kZeroDb = -1000.0f;
 
 template <typename T>
 T Step(T value, int steps) {
-  const T toward = steps < 0 ? -std::numeric_limits<T>::infinity()
-                             : std::numeric_limits<T>::infinity();
+  const T toward =
+      steps < 0 ? -std::numeric_limits<T>::infinity() : std::numeric_limits<T>::infinity();
   for (int i = std::abs(steps); i > 0; --i) value = std::nextafter(value, toward);
   return value;
 }
@@ -43,10 +43,12 @@ double Distance(const TsComplex& x, const TsComplex& y) {
 // times k, into the float `part`: narrows [low, high] to the magnitudes that do. False when
 // none is left.
 bool NarrowMagnitude(float part, double k, double& low, double& high) {
-  const double below = (static_cast<double>(part) +
-                        std::nextafter(part, -std::numeric_limits<float>::infinity())) / 2;
-  const double above = (static_cast<double>(part) +
-                        std::nextafter(part, std::numeric_limits<float>::infinity())) / 2;
+  const double below =
+      (static_cast<double>(part) + std::nextafter(part, -std::numeric_limits<float>::infinity())) /
+      2;
+  const double above =
+      (static_cast<double>(part) + std::nextafter(part, std::numeric_limits<float>::infinity())) /
+      2;
   if (k == 0) return below <= 0 && 0 <= above;
   low = std::max(low, (k > 0 ? below : above) / k);
   high = std::min(high, (k > 0 ? above : below) / k);

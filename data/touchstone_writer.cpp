@@ -1,11 +1,14 @@
 #include "lumen/data/touchstone_writer.h"
 
 #include <algorithm>
+#include <cerrno>
 #include <cmath>
 #include <cstdio>
+#include <cstring>
 #include <vector>
 
 #include "data/touchstone_value_text.h"
+#include "lumen/core/si_prefix.h"
 #include "lumen/platform/lumen_exception.h"
 #include "lumen/platform/text_conversion.h"
 
@@ -21,13 +24,12 @@ constexpr int kPairsPerLine = 4;
 struct UnitEntry {
   SnPFrequencyUnit unit;
   const char* token;
-  const char* name;  // as messages write it
   double multiplier;
 };
-constexpr UnitEntry kUnits[] = {{SNP_UNIT_HZ, "HZ", "Hz", 1.0},
-                                {SNP_UNIT_KHZ, "KHZ", "kHz", 1e3},
-                                {SNP_UNIT_MHZ, "MHZ", "MHz", 1e6},
-                                {SNP_UNIT_GHZ, "GHZ", "GHz", 1e9}};
+constexpr UnitEntry kUnits[] = {{SNP_UNIT_HZ, "HZ", 1.0},
+                                {SNP_UNIT_KHZ, "KHZ", 1e3},
+                                {SNP_UNIT_MHZ, "MHZ", 1e6},
+                                {SNP_UNIT_GHZ, "GHZ", 1e9}};
 
 const UnitEntry* FindUnit(SnPFrequencyUnit unit) {
   for (const UnitEntry& entry : kUnits) {
@@ -61,9 +63,43 @@ std::string Number(double value) {
   return text;
 }
 
-// The held stimulus `x` as messages show it: in the file's unit, as it would be written.
-std::string StimulusText(double x, double multiplier, const char* unit) {
-  return Number(x / multiplier) + (*unit ? " " : "") + unit;
+// How the stimulus appears: its option-line token, and its unit in messages.
+struct StimulusWords {
+  const char* token;
+  const char* unit;
+  bool siPrefix;  // messages show 2.5 GHz rather than 2500000000 Hz
+};
+
+StimulusWords WordsOf(ResultType type, SnPFrequencyUnit unit) {
+  switch (type) {
+    case RESULT_SEC:
+      return {"SEC", "s", true};
+    case RESULT_DBM:
+      return {"DBM", "dBm", false};
+    case RESULT_POINT:
+      return {"POINT", "", false};
+    default:
+      return {FindUnit(unit)->token, "Hz", true};
+  }
+}
+
+// The stimulus value `x` as messages show it: "2.5 GHz", "10 ps", "-5 dBm".
+std::string StimulusText(double x, const StimulusWords& words) {
+  double scale = 1.0;
+  char prefix = ' ';
+  if (words.siPrefix) GetSIPrefix(x, scale, prefix, 12, -15);
+  // Dividing by an exact power of ten keeps 1.2e9 Hz from showing as 1.2000000000000002 GHz.
+  const int exponent = static_cast<int>(std::lround(-std::log10(scale)));
+  const double shown = exponent >= 0 ? x / std::pow(10.0, exponent) : x * std::pow(10.0, -exponent);
+  std::string text = Number(shown);
+  if (prefix == static_cast<char>(0xB5)) {
+    text += " \xC2\xB5";  // micro, as UTF-8
+  } else if (prefix != ' ') {
+    text += std::string(" ") + prefix;
+  } else if (*words.unit) {
+    text += ' ';
+  }
+  return text + words.unit;
 }
 
 bool AllFinite(const std::vector<TsComplex>& data, std::size_t& first) {
@@ -121,9 +157,14 @@ class Output {
     Tally(number.exact, RelativeChange(number.readBack, held));
   }
   void Flush() {
+    errno = 0;
     m_out.write(m_text.data(), static_cast<std::streamsize>(m_text.size()));
+    const int error = errno;
     m_text.clear();
-    if (!m_out) Refuse("writing the Touchstone file failed");
+    if (m_out) return;
+    // A file stream fails with the reason of its system call (a full disk, a size limit).
+    Refuse(error != 0 ? std::string("writing the Touchstone file failed: ") + std::strerror(error)
+                      : std::string("writing the Touchstone file failed"));
   }
 
  private:
@@ -141,25 +182,6 @@ class Output {
   std::string m_text;
   TouchstoneWriteResult m_result;
 };
-
-// How the stimulus appears: its option-line token and its unit in messages.
-struct StimulusWords {
-  const char* token;
-  const char* unit;
-};
-
-StimulusWords WordsOf(ResultType type, SnPFrequencyUnit unit) {
-  switch (type) {
-    case RESULT_SEC:
-      return {"SEC", "s"};
-    case RESULT_DBM:
-      return {"DBM", "dBm"};
-    case RESULT_POINT:
-      return {"POINT", ""};
-    default:
-      return {FindUnit(unit)->token, FindUnit(unit)->name};
-  }
-}
 
 }  // namespace
 
@@ -206,8 +228,7 @@ TouchstoneWriter::TouchstoneWriter(const CSnPFileBase& file, const TouchstoneWri
     Refuse("value form " + std::to_string(options.form) + " is not RI, MA or DB");
   }
   if (!FindUnit(options.unit)) Refuse("unit " + std::to_string(options.unit) + " is unknown");
-  m_multiplier =
-      file.GetResultType() == RESULT_FREQUENCY ? SnPUnitMultiplier(options.unit) : 1.0;
+  m_multiplier = file.GetResultType() == RESULT_FREQUENCY ? SnPUnitMultiplier(options.unit) : 1.0;
   CheckNetwork();
   CheckNoise();
 }
@@ -216,7 +237,7 @@ void TouchstoneWriter::CheckNetwork() const {
   const int n = m_file.GetSNPType();
   const CSNParameter& first = m_file.GetParam(SNP_S11);
   const LumenUtility::InputArray& stimulus = first.GetStimulus();
-  const char* unit = WordsOf(m_file.GetResultType(), m_options.unit).unit;
+  const StimulusWords words = WordsOf(m_file.GetResultType(), m_options.unit);
   for (int k = 0; k < n * n; ++k) {
     const CSNParameter& trace = m_file.GetParam(static_cast<ESNParam>(k));
     const std::string name = PositionName(k / n + 1, k % n + 1);
@@ -232,8 +253,8 @@ void TouchstoneWriter::CheckNetwork() const {
       unsigned int i = 0;
       while (trace.GetStimulus()[i] == stimulus[i]) ++i;
       Refuse(name + " lies on other stimulus points than S11: point " + std::to_string(i + 1) +
-             " is " + StimulusText(trace.GetStimulus()[i], m_multiplier, unit) + " against " +
-             StimulusText(stimulus[i], m_multiplier, unit));
+             " is " + StimulusText(trace.GetStimulus()[i], words) + " against " +
+             StimulusText(stimulus[i], words));
     }
     std::size_t bad = 0;
     if (!AllFinite(trace.GetData(), bad)) {
@@ -260,9 +281,8 @@ void TouchstoneWriter::CheckNetwork() const {
   for (double r : references) {
     if (!std::isfinite(r)) Refuse("a per-port reference resistance is not finite");
   }
-  if (m_options.version == 1 &&
-      std::any_of(references.begin(), references.end(),
-                  [&](double r) { return r != references.front(); })) {
+  if (m_options.version == 1 && std::any_of(references.begin(), references.end(),
+                                            [&](double r) { return r != references.front(); })) {
     std::string list;
     for (double r : references) list += (list.empty() ? "" : ", ") + Number(r);
     Refuse("version 1 holds one reference resistance for all ports, but the ports have " + list +
@@ -272,15 +292,13 @@ void TouchstoneWriter::CheckNetwork() const {
 
 void TouchstoneWriter::CheckNoise() {
   const SnPFileInfo& info = m_file.GetFileInfo();
-  m_reference = m_options.version == 1 && !info.portReferences.empty()
-                         ? info.portReferences.front()
-                         : info.referenceResistance;
+  m_reference = m_options.version == 1 && !info.portReferences.empty() ? info.portReferences.front()
+                                                                       : info.referenceResistance;
   const int traces = m_file.GetNumCustomParams();
   if (!m_options.noise || traces == 0) return;
   const int n = m_file.GetSNPType();
   if (n != 2) {
-    Refuse("noise data belongs to two-port networks; this one has " + std::to_string(n) +
-           " ports");
+    Refuse("noise data belongs to two-port networks; this one has " + std::to_string(n) + " ports");
   }
   if (traces != 3) {
     Refuse("noise data takes three traces (NFmin, GammaOpt, Rn), not " + std::to_string(traces));
@@ -313,15 +331,15 @@ void TouchstoneWriter::CheckNoise() {
   if (m_reference == 0) Refuse("noise resistances cannot be normalised to a reference of 0 ohm");
   if (m_options.version == 1) {
     const LumenUtility::InputArray& network = m_file.GetParam(SNP_S11).GetStimulus();
-    const char* unit = WordsOf(m_file.GetResultType(), m_options.unit).unit;
+    const StimulusWords words = WordsOf(m_file.GetResultType(), m_options.unit);
     if (network.empty()) {
       Refuse("version 1 noise data must follow network data; this set has no network points");
     }
     if (stimulus.front() > network.back()) {
       Refuse("version 1 noise data must start at or below the last network point (" +
-             StimulusText(network.back(), m_multiplier, unit) +
+             StimulusText(network.back(), words) +
              ") for a reader to tell it from network data, but it starts at " +
-             StimulusText(stimulus.front(), m_multiplier, unit) + "; write version 2");
+             StimulusText(stimulus.front(), words) + "; write version 2");
     }
   }
   m_writeNoise = true;

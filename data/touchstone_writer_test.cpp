@@ -6,6 +6,7 @@
 #include <charconv>
 #include <cmath>
 #include <cstdint>
+#include <fstream>
 #include <random>
 #include <sstream>
 #include <string>
@@ -38,7 +39,8 @@ CSnPFileBase Read(const std::string& text, int ports) {
   CSnPFileBase file(ports);
   const int points = file.ReadSNPText(text);
   EXPECT_GE(points, 0) << std::string(file.GetReadError().begin(), file.GetReadError().end())
-                       << "\n" << text.substr(0, 400);
+                       << "\n"
+                       << text.substr(0, 400);
   return file;
 }
 
@@ -60,7 +62,8 @@ bool Same(double a, double b) {
 
 testing::AssertionResult SameTrace(const CSNParameter& a, const CSNParameter& b,
                                    const std::string& what) {
-  if (a.GetStimulus().size() != b.GetStimulus().size() || a.GetData().size() != b.GetData().size()) {
+  if (a.GetStimulus().size() != b.GetStimulus().size() ||
+      a.GetData().size() != b.GetData().size()) {
     return testing::AssertionFailure() << what << ": sizes differ";
   }
   for (unsigned int i = 0; i < a.GetStimulus().size(); ++i) {
@@ -70,7 +73,8 @@ testing::AssertionResult SameTrace(const CSNParameter& a, const CSNParameter& b,
     }
   }
   for (std::size_t i = 0; i < a.GetData().size(); ++i) {
-    if (!Same(a.GetData()[i].re, b.GetData()[i].re) || !Same(a.GetData()[i].im, b.GetData()[i].im)) {
+    if (!Same(a.GetData()[i].re, b.GetData()[i].re) ||
+        !Same(a.GetData()[i].im, b.GetData()[i].im)) {
       return testing::AssertionFailure()
              << what << " value " << i << ": (" << a.GetData()[i].re << ", " << a.GetData()[i].im
              << ") vs (" << b.GetData()[i].re << ", " << b.GetData()[i].im << ")";
@@ -221,7 +225,8 @@ TEST(TouchstoneWriter, RiInHzKeepsAnyFiniteTraceBitForBit) {
       TouchstoneWriteResult result;
       const std::string text = Write(set, Options(version, SNP_RI), &result);
       EXPECT_TRUE(SameSet(Read(text, n), set)) << n << " ports, version " << version;
-      EXPECT_EQ(result.values, static_cast<std::size_t>(n * n * set.GetParam(SNP_S11).GetNumPoints()));
+      EXPECT_EQ(result.values,
+                static_cast<std::size_t>(n * n * set.GetParam(SNP_S11).GetNumPoints()));
       EXPECT_EQ(result.inexactValues, 0u);
       EXPECT_EQ(result.inexactStimulus, 0u);
     }
@@ -282,7 +287,8 @@ TEST(TouchstoneWriter, ManyTwoPortValuesReadBackInEveryForm) {
 // float step of the angle, and the rounding of both parts to float.
 double FormTolerance(const TsComplex& v, ESNPForm form) {
   const double degrees = std::fabs(std::atan2(v.im, v.re) * 57.29577951308232);
-  const double angleStep = std::nextafter(static_cast<float>(degrees), 1e30f) - static_cast<float>(degrees);
+  const double angleStep =
+      std::nextafter(static_cast<float>(degrees), 1e30f) - static_cast<float>(degrees);
   double magnitudeStep = std::ldexp(1.0, -23);
   if (form == SNP_DB) {
     const float db = static_cast<float>(std::fabs(v.LogMag()));
@@ -337,8 +343,8 @@ TEST(TouchstoneWriter, StimulusInAScaledUnitMovesAtMostOneStep) {
   CSNParameter trace(stimulus);
   trace.SetStimulus(stimulus);
   set.GetParam(SNP_S11) = trace;
-  for (SnPFrequencyUnit unit : {LumenUtility::SNP_UNIT_KHZ, LumenUtility::SNP_UNIT_MHZ,
-                                LumenUtility::SNP_UNIT_GHZ}) {
+  for (SnPFrequencyUnit unit :
+       {LumenUtility::SNP_UNIT_KHZ, LumenUtility::SNP_UNIT_MHZ, LumenUtility::SNP_UNIT_GHZ}) {
     TouchstoneWriteResult result;
     const CSnPFileBase read = Read(Write(set, Options(1, SNP_RI, unit), &result), 1);
     std::size_t moved = 0;
@@ -458,14 +464,16 @@ TEST(TouchstoneWriter, RefusesSetsItCannotWriteBeforeWritingAnything) {
 
   CSnPFileBase shorter = TwoPortSet(x);
   shorter.GetParam(SNP_S21) = TwoPortSet({1e9, 2e9}).GetParam(SNP_S21);
-  EXPECT_EQ(Refusal(shorter, v1), "S21 has 2 points and S11 3; the traces of a file share their points");
+  EXPECT_EQ(Refusal(shorter, v1),
+            "S21 has 2 points and S11 3; the traces of a file share their points");
   CSnPFileBase fewerValues = TwoPortSet(x);
   fewerValues.GetParam(SNP_S12).GetData().pop_back();
   EXPECT_EQ(Refusal(fewerValues, v1), "S12 holds 2 values on 3 stimulus points");
   CSnPFileBase moved = TwoPortSet(x);
   moved.GetParam(SNP_S22).SetStimulus(InputArray(std::vector<double>{1e9, 2.5e9, 3e9}));
-  EXPECT_EQ(Refusal(moved, v1), "S22 lies on other stimulus points than S11: point 2 is 2.5 GHz "
-                                "against 2 GHz");
+  EXPECT_EQ(Refusal(moved, v1),
+            "S22 lies on other stimulus points than S11: point 2 is 2.5 GHz "
+            "against 2 GHz");
   CSnPFileBase nan = TwoPortSet(x);
   nan.GetParam(SNP_S21).GetData()[1].im = std::nanf("");
   EXPECT_EQ(Refusal(nan, v1), "S21 at point 2 is not a finite value");
@@ -480,15 +488,17 @@ TEST(TouchstoneWriter, RefusesSetsItCannotWriteBeforeWritingAnything) {
   ASSERT_EQ(references.ReadSNPText("[Version] 2.0\n# GHz RI\n[Number of Ports] 2\n"
                                    "[Reference] 50 75\n[Network Data]\n1 1 0 0 0 0 0 1 0\n"),
             1);
-  EXPECT_EQ(Refusal(references, v1), "version 1 holds one reference resistance for all ports, "
-                                     "but the ports have 50, 75 ohm; write version 2");
+  EXPECT_EQ(Refusal(references, v1),
+            "version 1 holds one reference resistance for all ports, "
+            "but the ports have 50, 75 ohm; write version 2");
   EXPECT_EQ(Refusal(references, v2), "(accepted)");
 }
 
 TEST(TouchstoneWriter, RefusesNoiseDataItCannotWrite) {
-  const std::string noisy = "[Version] 2.0\n# GHz MA R 50\n[Number of Ports] 2\n[Network Data]\n"
-                            "1 1 0 0 0 0 0 1 0\n2 1 0 0 0 0 0 1 0\n[Noise Data]\n"
-                            "3 2 0.5 45 0.2\n4 2 0.5 45 0.2\n[End]\n";
+  const std::string noisy =
+      "[Version] 2.0\n# GHz MA R 50\n[Number of Ports] 2\n[Network Data]\n"
+      "1 1 0 0 0 0 0 1 0\n2 1 0 0 0 0 0 1 0\n[Noise Data]\n"
+      "3 2 0.5 45 0.2\n4 2 0.5 45 0.2\n[End]\n";
   CSnPFileBase file(2);
   ASSERT_EQ(file.ReadSNPText(noisy), 2);
   const TouchstoneWriteOptions v1 = Options(1, SNP_MA, LumenUtility::SNP_UNIT_GHZ);
@@ -529,6 +539,18 @@ TEST(TouchstoneWriter, AFailingStreamIsAnError) {
   } catch (const LumenException& e) {
     EXPECT_EQ(e.GetCode(), LumenUtility::LUMEN_E_BOUNDS);
     EXPECT_EQ(e.GetMessage(), L"writing the Touchstone file failed");
+  }
+  // A file stream says why. The text goes out in blocks, so a large set meets the full
+  // device while being written, not only when the stream is closed.
+  std::ofstream full("/dev/full", std::ios::binary);
+  if (!full) GTEST_SKIP() << "no /dev/full";
+  std::vector<double> x(20000);
+  for (std::size_t i = 0; i < x.size(); ++i) x[i] = 1e9 + 1e5 * static_cast<double>(i);
+  try {
+    TouchstoneWriter(TwoPortSet(x), Options(1, SNP_RI)).Write(full);
+    ADD_FAILURE() << "no exception";
+  } catch (const LumenException& e) {
+    EXPECT_EQ(e.GetMessage(), L"writing the Touchstone file failed: No space left on device");
   }
 }
 

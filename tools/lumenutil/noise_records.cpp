@@ -18,15 +18,15 @@ std::vector<NoiseRecord> NoiseRecords(const CSnPFileBase& file) {
   const CSNParameter& gamma = file.GetCustomParam(1);
   const CSNParameter& rn = file.GetCustomParam(2);
   const std::vector<double> x = nf.GetStimulus().GetArray();
-  const std::size_t count = std::min({x.size(), nf.GetData().size(), gamma.GetData().size(),
-                                      rn.GetData().size()});
+  const std::size_t count =
+      std::min({x.size(), nf.GetData().size(), gamma.GetData().size(), rn.GetData().size()});
   for (std::size_t i = 0; i < count; ++i) {
     const LumenUtility::TsComplex& g = gamma.GetData()[i];
     // atan2 rather than Phase(): a GammaOpt of exactly 0 shows 0 degrees, not 90.
-    records.push_back({x[i], 10.0 * std::log10(static_cast<double>(nf.GetData()[i].re)), g.Mag(),
-                       std::atan2(static_cast<double>(g.im), static_cast<double>(g.re)) *
-                           kDegreesPerRadian,
-                       rn.GetData()[i].re});
+    records.push_back(
+        {x[i], 10.0 * std::log10(static_cast<double>(nf.GetData()[i].re)), g.Mag(),
+         std::atan2(static_cast<double>(g.im), static_cast<double>(g.re)) * kDegreesPerRadian,
+         rn.GetData()[i].re});
   }
   return records;
 }

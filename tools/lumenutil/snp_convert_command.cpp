@@ -56,9 +56,7 @@ void AddSnpConvertCommand(CLI::App& snp) {
       ->add_option("--format,-f", options->format,
                    "ri, ma (magnitude, degrees) or db (dB, degrees); default: IN's")
       ->check(CLI::IsMember({"ri", "ma", "db"}, CLI::ignore_case));
-  command
-      ->add_option("--unit", options->unit,
-                   "frequency unit: hz, khz, mhz or ghz; default: IN's")
+  command->add_option("--unit", options->unit, "frequency unit: hz, khz, mhz or ghz; default: IN's")
       ->check(CLI::IsMember({"hz", "khz", "mhz", "ghz"}, CLI::ignore_case));
   AddPortsOption(*command, options->ports);
   command->callback([options] { Convert(*options); });

@@ -75,11 +75,11 @@ void RefuseUnlessAscending(const std::string& path, const CSnPFileBase& file) {
   const StimulusAxis axis = AxisOf(file.GetResultType());
   for (unsigned int i = 1; i < x.size(); ++i) {
     if (!(x[i] > x[i - 1])) {
-      throw std::runtime_error(
-          path + ": the " + LowerAscii(axis.quantity) + " must ascend strictly, but point " +
-          std::to_string(i + 1) + " (" + WithUnit(x[i], axis.unit, axis.siPrefix) +
-          ") does not lie above point " + std::to_string(i) + " (" +
-          WithUnit(x[i - 1], axis.unit, axis.siPrefix) + ")");
+      throw std::runtime_error(path + ": the " + LowerAscii(axis.quantity) +
+                               " must ascend strictly, but point " + std::to_string(i + 1) + " (" +
+                               WithUnit(x[i], axis.unit, axis.siPrefix) +
+                               ") does not lie above point " + std::to_string(i) + " (" +
+                               WithUnit(x[i - 1], axis.unit, axis.siPrefix) + ")");
     }
   }
 }
@@ -106,8 +106,8 @@ ParameterDifference Compare(const CSnPFileBase& a, const CSnPFileBase& b,
                             const MatrixPosition& position) {
   const std::vector<TsComplex>& x = TraceAt(a, position).GetData();
   const std::vector<TsComplex>& y = TraceAt(b, position).GetData();
-  ParameterDifference d{position, std::vector<double>(x.size()), std::vector<double>(x.size()),
-                        {}, {}};
+  ParameterDifference d{
+      position, std::vector<double>(x.size()), std::vector<double>(x.size()), {}, {}};
   for (std::size_t i = 0; i < x.size(); ++i) {
     d.db[i] = y[i].LogMag() - x[i].LogMag();
     double degrees = std::remainder((y[i].Phase() - x[i].Phase()) * kDegreesPerRadian, 360.0);
@@ -184,9 +184,9 @@ void Diff(const DiffOptions& options) {
                              "; only networks of one size compare");
   }
   if (a.GetResultType() != b.GetResultType()) {
-    throw std::runtime_error(options.a + " holds " + LowerAscii(AxisOf(a.GetResultType()).quantity) +
-                             " values and " + options.b + " " +
-                             LowerAscii(AxisOf(b.GetResultType()).quantity) + " values");
+    throw std::runtime_error(
+        options.a + " holds " + LowerAscii(AxisOf(a.GetResultType()).quantity) + " values and " +
+        options.b + " " + LowerAscii(AxisOf(b.GetResultType()).quantity) + " values");
   }
   RefuseUnlessAscending(options.a, a);
   RefuseUnlessAscending(options.b, b);
@@ -219,23 +219,27 @@ void AddSnpDiffCommand(CLI::App& snp) {
       "within the tolerances, 1 outside them, 2 on an error");
   auto options = std::make_shared<DiffOptions>();
   command->add_option("A", options->a, "Touchstone file compared against")->required();
-  command->add_option("B", options->b,
-                      "Touchstone file compared; carried onto A's points when they differ")
+  command
+      ->add_option("B", options->b,
+                   "Touchstone file compared; carried onto A's points when they differ")
       ->required();
   command->add_option("--params,-p", options->params,
                       "comma-separated traces, e.g. S21,S11 (default: all, in file order)");
-  command->add_option("--tolerance-db", options->toleranceDb,
-                      "largest magnitude difference accepted, in dB")
+  command
+      ->add_option("--tolerance-db", options->toleranceDb,
+                   "largest magnitude difference accepted, in dB")
       ->check(CLI::NonNegativeNumber)
       ->capture_default_str();
-  command->add_option("--tolerance-deg", options->toleranceDeg,
-                      "largest phase difference accepted, in degrees")
+  command
+      ->add_option("--tolerance-deg", options->toleranceDeg,
+                   "largest phase difference accepted, in degrees")
       ->check(CLI::NonNegativeNumber)
       ->capture_default_str();
   command->add_flag("--hold-ends", options->holdEnds,
                     "where A reaches beyond B, hold B's end values instead of refusing");
-  command->add_option("--format,-f", options->format,
-                      "table (largest differences) or csv (the difference at every point)")
+  command
+      ->add_option("--format,-f", options->format,
+                   "table (largest differences) or csv (the difference at every point)")
       ->check(CLI::IsMember({"table", "csv"}))
       ->capture_default_str();
   AddPortsOption(*command, options->ports);

@@ -88,9 +88,9 @@ void AddSnpExportCommand(CLI::App& snp) {
       "per stimulus point, numbers with enough digits to read back exactly");
   auto options = std::make_shared<ExportOptions>();
   command->add_option("FILE", options->path, "Touchstone file")->required();
-  CLI::Option* params = command->add_option(
-      "--params,-p", options->params,
-      "comma-separated traces, e.g. S21,S11 (default: all, in file order)");
+  CLI::Option* params =
+      command->add_option("--params,-p", options->params,
+                          "comma-separated traces, e.g. S21,S11 (default: all, in file order)");
   CLI::Option* format =
       command->add_option("--format,-f", options->format,
                           "ri, ma (linear magnitude, degrees), db (dB, degrees), logmag, phase, "

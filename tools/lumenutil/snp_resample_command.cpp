@@ -23,6 +23,7 @@ struct ResampleOptions {
   int points = 0;
   bool log = false;
   bool holdEnds = false;
+  int version = 1;
   std::string output;
   int ports = 0;
 };
@@ -67,7 +68,8 @@ void Resample(const ResampleOptions& options) {
       (options.log ? " logarithmic" : " linear") + " points, " +
       WithUnit(start, axis.unit, axis.siPrefix) + " to " +
       WithUnit(stop, axis.unit, axis.siPrefix) + (options.holdEnds ? ", end values held" : "");
-  LumenUtility::TouchstoneWriteOptions write;  // version 1, RI, Hz
+  LumenUtility::TouchstoneWriteOptions write;  // RI, Hz
+  write.version = options.version;
   write.comment = comment;
   WriteTouchstoneFile(file, write, options.output, "snp resample", true);
 }
@@ -75,10 +77,11 @@ void Resample(const ResampleOptions& options) {
 }  // namespace
 
 void AddSnpResampleCommand(CLI::App& snp) {
-  CLI::App* command =
-      snp.add_subcommand("resample",
-                         "Carry every trace of a Touchstone file onto a new linear or logarithmic "
-                         "sweep by circular interpolation and write a Touchstone version 1 file");
+  CLI::App* command = snp.add_subcommand(
+      "resample",
+      "Carry every trace of a Touchstone file onto a new linear or logarithmic "
+      "sweep by circular interpolation and write a Touchstone file (version 1 unless "
+      "--version 2), real-imaginary in Hz");
   auto options = std::make_shared<ResampleOptions>();
   command->add_option("FILE", options->path, "Touchstone file")->required();
   command->add_option("--start", options->start, "first stimulus value, e.g. 1.5e9, 1.5G or 1.5GHz")
@@ -92,6 +95,9 @@ void AddSnpResampleCommand(CLI::App& snp) {
                     "where the sweep reaches beyond the file, hold each trace's end values");
   command->add_option("--output,-o", options->output, "Touchstone file to write (OUT.sNp)")
       ->required();
+  command->add_option("--version", options->version, "Touchstone version written: 1 or 2 (2.0)")
+      ->check(CLI::IsMember({1, 2}))
+      ->capture_default_str();
   AddPortsOption(*command, options->ports);
   command->callback([options] { Resample(*options); });
 }

@@ -44,11 +44,17 @@ void WriteTouchstoneFile(const CSnPFileBase& file, TouchstoneWriteOptions option
     } catch (const LumenException& again) {
       throw std::runtime_error("cannot write " + path + ": " + MessageOf(again));
     }
-    std::cerr << "lumenutil " << command << ": warning: noise data not written: "
-              << MessageOf(refusal) << '\n';
+    std::cerr << "lumenutil " << command
+              << ": warning: noise data not written: " << MessageOf(refusal) << '\n';
   }
   LumenUtility::TouchstoneWriteResult result;
-  WriteOutputFile(path, [&](std::ostream& out) { result = writer->Write(out); });
+  WriteOutputFile(path, [&](std::ostream& out) {
+    try {
+      result = writer->Write(out);
+    } catch (const LumenException& failure) {
+      throw std::runtime_error(path + ": " + MessageOf(failure));
+    }
+  });
   if (result.inexactValues > 0) {
     std::cerr << "lumenutil " << command << ": note: " << result.inexactValues << " of "
               << result.values << " values lie between the values "
@@ -58,9 +64,11 @@ void WriteTouchstoneFile(const CSnPFileBase& file, TouchstoneWriteOptions option
   }
   if (result.inexactStimulus > 0) {
     std::cerr << "lumenutil " << command << ": note: " << result.inexactStimulus
-              << " stimulus values have no exact text in " << LumenUtility::SnPUnitToken(options.unit)
+              << " stimulus values have no exact text in "
+              << LumenUtility::SnPUnitToken(options.unit)
               << " and were written to the nearest, moving by up to "
-              << Rounded(result.largestStimulusChange, 2) << " of their value; HZ keeps them exactly\n";
+              << Rounded(result.largestStimulusChange, 2)
+              << " of their value; HZ keeps them exactly\n";
   }
 }
 

@@ -82,6 +82,19 @@ before=$(sha "$work/noise.s2p")
 message=$("$tool" snp convert "$example" "$work/missing/x.s2p" 2>&1) && fail "convert into a missing directory exited 0"
 expect_line "$message" 'x\.s2p: cannot be written: No such file or directory$'
 
+# A write that fails midway leaves the target as it was and no temporary file: a file size
+# limit of 8 KiB stops the 50 KB output, by SIGXFSZ or, where that is ignored, by EFBIG.
+printf 'keep me\n' >"$work/target.s2p"
+status=$( { (ulimit -f 8; exec "$tool" snp convert "$example" "$work/target.s2p" --format ri); } 2>/dev/null
+  echo $?)
+[[ $status -eq $((128 + $(kill -l XFSZ))) ]] || fail "a convert beyond the size limit exited with $status"
+[[ $(cat "$work/target.s2p") == "keep me" ]] || fail "a convert stopped by SIGXFSZ changed its target"
+message=$(ulimit -f 8; trap '' XFSZ; "$tool" snp convert "$example" "$work/target.s2p" --format ri 2>&1)
+status=$?
+[[ $status -eq 1 ]] || fail "a convert that hit EFBIG exited with $status"
+expect_line "$message" "^lumenutil: $work/target\\.s2p: writing the Touchstone file failed: File too large\$"
+[[ $(cat "$work/target.s2p") == "keep me" ]] || fail "a convert that hit EFBIG changed its target"
+
 # Noise data keeps its own frequencies through a conversion, in either version.
 "$tool" snp convert "$work/noise.s2p" "$work/noise_ri.s2p" --format ri || fail "noise convert failed"
 diff <("$tool" snp export "$work/noise.s2p" --noise) <("$tool" snp export "$work/noise_ri.s2p" --noise) ||

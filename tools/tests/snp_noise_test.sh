@@ -48,4 +48,15 @@ grep -q '<polyline' "$work/nf.svg" || fail "no curve in nf.svg"
 message=$("$tool" snp plot "$example" --format nf -o "$work/none.svg" 2>&1) && fail "plot nf without noise exited 0"
 expect_line "$message" 'holds no noise data$'
 [[ ! -e "$work/none.svg" ]] || fail "a refused plot left a file"
+# resample writes version 1 unless told otherwise; noise data that version 1 cannot hold
+# (here: starting above the new sweep's last point) is left out with a warning, and kept in
+# version 2.
+message=$("$tool" snp resample "$work/amp.s2p" --start 1G --stop 1.2G --points 3 -o "$work/low.s2p" 2>&1) ||
+  fail "resample below the noise data failed"
+expect_line "$message" '^lumenutil snp resample: warning: noise data not written: version 1 noise data must start at or below the last network point \(1\.2 GHz\) for a reader to tell it from network data, but it starts at 1\.5 GHz; write version 2$'
+expect_line "$("$tool" snp info "$work/low.s2p")" '^noise data +none$'
+"$tool" snp resample "$work/amp.s2p" --start 1G --stop 1.2G --points 3 --version 2 -o "$work/low2.s2p" ||
+  fail "resample --version 2 failed"
+diff <("$tool" snp export "$work/amp.s2p" --noise) <("$tool" snp export "$work/low2.s2p" --noise) ||
+  fail "resample --version 2 changed the noise records"
 exit $((failures > 0))

@@ -60,9 +60,9 @@ struct TouchstoneWriteOptions {
 // What a write could not keep bit for bit; all zero for a set read from a file and written
 // in its own form and unit, and for any set written in RI and Hz.
 struct TouchstoneWriteResult {
-  std::size_t values = 0;         // complex values written, network and noise
-  std::size_t inexactValues = 0;  // of those, values that read back to other floats
-  double largestValueChange = 0;  // largest |read back - held| / |held| among them
+  std::size_t values = 0;            // complex values written, network and noise
+  std::size_t inexactValues = 0;     // of those, values that read back to other floats
+  double largestValueChange = 0;     // largest |read back - held| / |held| among them
   std::size_t inexactStimulus = 0;   // stimulus values the unit cannot hold exactly
   double largestStimulusChange = 0;  // largest relative change among them (about 1e-16)
 };
@@ -81,7 +81,8 @@ class LUMEN_API TouchstoneWriter {
   TouchstoneWriter(const CSnPFileBase& file, const TouchstoneWriteOptions& options);
 
   // Writes the whole file to `out`. Throws LumenException(LUMEN_E_BOUNDS, "writing the
-  // Touchstone file failed") when the stream fails; what reached it by then is incomplete.
+  // Touchstone file failed", followed by ": " and the system's reason when the stream's last
+  // system call left one) when the stream fails; what reached it by then is incomplete.
   TouchstoneWriteResult Write(std::ostream& out) const;
 
  private:
