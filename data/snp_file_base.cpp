@@ -106,10 +106,13 @@ int CSnPFileBase::ReadParsed(LumenUtility::TouchstoneParser& parser) {
   if (noise) {
     static const wchar_t* const kNoiseNames[3] = {L"NFmin", L"GammaOpt", L"Rn"};
     static const ESNPForm kNoiseForms[3] = {SNP_DB, SNP_MA, SNP_RI};
-    const std::size_t records = std::min<std::size_t>(m_info.noisePoints, points);
+    // On the noise records' own frequencies: a noise record measured at 1.5 GHz is not
+    // the network point that happens to share its index.
+    const InputArray noiseStimulus(content.noiseStimulus);
+    const std::size_t records = content.noiseStimulus.size();
     for (int t = 0; t < 3; ++t) {
-      CSNParameter trace(stimulus);
-      trace.SetStimulus(stimulus);
+      CSNParameter trace(noiseStimulus);
+      trace.SetStimulus(noiseStimulus);
       for (std::size_t i = 0; i < records; ++i) {
         const float* record = &content.noise[4 * i];
         const float a = t == 0 ? record[0] : t == 1 ? record[1] : record[3];

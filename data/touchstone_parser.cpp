@@ -285,7 +285,7 @@ bool TouchstoneParser::ReadNetworkData() {
     const bool drop = !c.stimulus.empty() && stimulus <= c.stimulus.back();
     if (c.ports == 2 && m_noiseMarked && drop) {
       if (!RequireDeclaredPoints()) return false;
-      return ReadNoiseData(true);
+      return ReadNoiseData(true, stimulus);
     }
     const int line = m_scanner.Line();
     if (drop && c.ports == 2 && c.info.version == 1 && m_frequencyDropLine == 0) {
@@ -366,10 +366,11 @@ bool TouchstoneParser::ReadDataKeyword(std::string_view token) {
   return Fail("[" + name + "] is not expected among the data");
 }
 
-bool TouchstoneParser::ReadNoiseData(bool firstStimulus) {
+bool TouchstoneParser::ReadNoiseData(bool haveFirst, double first) {
   TouchstoneContent& c = *m_content;
   if (c.ports != 2) return Fail("noise data is only read for two-port networks");
-  bool haveStimulus = firstStimulus;
+  bool haveStimulus = haveFirst;
+  double stimulus = first;
   for (;;) {
     if (!haveStimulus) {
       const std::string_view token = m_scanner.NextValueToken();
@@ -380,8 +381,7 @@ bool TouchstoneParser::ReadNoiseData(bool firstStimulus) {
         if (m_scanner.ReadKeyword(name) && name == "END") return true;
         return Fail(Quote(token) + " is not expected among the noise data");
       }
-      double unused = 0.0;
-      if (!ReadStimulus(token, "a noise stimulus value", unused)) return false;
+      if (!ReadStimulus(token, "a noise stimulus value", stimulus)) return false;
     }
     haveStimulus = false;
     const std::size_t start = c.noise.size();
@@ -392,6 +392,7 @@ bool TouchstoneParser::ReadNoiseData(bool firstStimulus) {
     if (!std::isfinite(c.noise[start]) || !std::isfinite(c.noise[start + 3])) {
       return FailAtLine(line, "the noise record is beyond the range of single-precision values");
     }
+    c.noiseStimulus.push_back(stimulus);
     ++c.info.noisePoints;
   }
 }

@@ -25,6 +25,7 @@ struct TouchstoneContent {
   std::vector<int> pointLines;   // line of each point's stimulus value, from 1
   std::vector<float> values;     // pairsPerPoint (a, b) pairs per point, in file order
   std::vector<float> noise;      // per noise record: 2*NFmin dB, |GammaOpt|, angle deg, Rn ohms
+  std::vector<double> noiseStimulus;  // scaled like `stimulus`, one per noise record
 };
 
 class TouchstoneParser {
@@ -59,9 +60,9 @@ class TouchstoneParser {
   // With `token` a keyword among the data: reads [End], or the [Noise Data] section that
   // follows its keyword, either of which ends the data; false for any other keyword.
   bool ReadDataKeyword(std::string_view token);
-  // Reads noise records; `firstStimulus` is true when the stimulus token of the first record
-  // has already been read.
-  bool ReadNoiseData(bool firstStimulus);
+  // Reads noise records; with `haveFirst` the stimulus of the first record has already been
+  // read, as `first` (scaled).
+  bool ReadNoiseData(bool haveFirst, double first = 0.0);
   // Reads `count` values of one record into `out`, skipping comments; `what` names the
   // record for errors.
   bool ReadRecordValues(int count, int recordLine, const char* what, std::vector<float>& out);

@@ -1,5 +1,5 @@
 // Measurement data containers and files: named sample buffers and their matrix, error-term
-// names, Touchstone traces and their reader.
+// names, Touchstone traces, their reader and writer.
 #pragma once
 
 #include "lumen/data/data_matrix.h"
@@ -10,3 +10,4 @@
 #include "lumen/data/snp_file_base.h"
 #include "lumen/data/snp_trace_names.h"
 #include "lumen/data/snp_types.h"
+#include "lumen/data/touchstone_writer.h"

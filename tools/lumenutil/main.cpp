@@ -7,6 +7,7 @@
 #include <string>
 
 #include "lumenutil/commands.h"
+#include "lumenutil/exit_status.h"
 
 namespace {
 
@@ -23,7 +24,7 @@ int CheckStandardOutput() {
   const int error = errno;
   std::cerr << "lumenutil: cannot write to standard output"
             << (error != 0 ? std::string(": ") + std::strerror(error) : std::string()) << '\n';
-  return 1;
+  return lumenutil::ErrorStatus();
 }
 
 }  // namespace
@@ -42,13 +43,14 @@ int main(int argc, char** argv) {
     return status == 0 ? CheckStandardOutput() : kUsageError;
   } catch (const std::exception& e) {
     std::cerr << "lumenutil: " << e.what() << '\n';
-    return 1;
+    return lumenutil::ErrorStatus();
   } catch (std::int32_t code) {  // a bare error code thrown by the library
     std::cerr << "lumenutil: error 0x" << std::hex << static_cast<std::uint32_t>(code) << '\n';
-    return 1;
+    return lumenutil::ErrorStatus();
   } catch (...) {
     std::cerr << "lumenutil: unexpected error\n";
-    return 1;
+    return lumenutil::ErrorStatus();
   }
-  return CheckStandardOutput();
+  const int output = CheckStandardOutput();
+  return output != 0 ? output : lumenutil::ResultStatus();
 }

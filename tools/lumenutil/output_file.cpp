@@ -18,7 +18,23 @@ namespace {
 char g_temporaryPath[4096];
 volatile std::sig_atomic_t g_haveTemporary = 0;
 
-constexpr int kStopSignals[] = {SIGINT, SIGTERM, SIGHUP};
+// SIGXFSZ stops a process whose file outgrows its size limit (ulimit -f) in mid-write.
+constexpr int kStopSignals[] = {SIGINT, SIGTERM, SIGHUP, SIGXFSZ};
+constexpr int kStopSignalCount = sizeof kStopSignals / sizeof kStopSignals[0];
+// The handling each signal had before; one that was ignored (SIGHUP under nohup, SIGXFSZ
+// turned into an EFBIG write error) stays ignored.
+void (*g_previousHandlers[kStopSignalCount])(int);
+
+void CatchStopSignals(void (*handler)(int)) {
+  for (int i = 0; i < kStopSignalCount; ++i) {
+    g_previousHandlers[i] = std::signal(kStopSignals[i], handler);
+    if (g_previousHandlers[i] == SIG_IGN) std::signal(kStopSignals[i], SIG_IGN);
+  }
+}
+
+void RestoreStopSignals() {
+  for (int i = 0; i < kStopSignalCount; ++i) std::signal(kStopSignals[i], g_previousHandlers[i]);
+}
 
 extern "C" void RemoveTemporaryAndStop(int signal) {
   if (g_haveTemporary) ::unlink(g_temporaryPath);
@@ -41,7 +57,7 @@ class TemporaryFile {
     if (m_path.size() >= sizeof g_temporaryPath) {
       throw std::runtime_error(target + ": cannot be written: the path is too long");
     }
-    for (int signal : kStopSignals) std::signal(signal, RemoveTemporaryAndStop);
+    CatchStopSignals(RemoveTemporaryAndStop);
     std::memcpy(g_temporaryPath, m_path.c_str(), m_path.size() + 1);
     m_fd = ::mkstemp(g_temporaryPath);
     if (m_fd < 0) {
@@ -89,7 +105,7 @@ class TemporaryFile {
   }
   static void Release() {
     g_haveTemporary = 0;
-    for (int signal : kStopSignals) std::signal(signal, SIG_DFL);
+    RestoreStopSignals();
   }
 
   std::string m_target;

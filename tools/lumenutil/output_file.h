@@ -12,9 +12,9 @@ namespace lumenutil {
 // exist yet, is written as a temporary file in the same directory, flushed to disk and
 // renamed over `path` only when `write` returned and every byte was written; the new file
 // keeps the mode of the file it replaces (new files get 0666 less the umask). On any failure,
-// and when the process is stopped by SIGINT, SIGTERM or SIGHUP meanwhile, the temporary file
-// is removed and `path` stays exactly as it was. Anything else (a device such as /dev/null, a
-// FIFO) is written in place.
+// and when the process is stopped by SIGINT, SIGTERM, SIGHUP or SIGXFSZ meanwhile (those it
+// does not ignore), the temporary file is removed and `path` stays exactly as it was.
+// Anything else (a device such as /dev/null, a FIFO) is written in place.
 // Throws std::runtime_error("PATH: cannot be written: REASON") when the file cannot be
 // created and "PATH: writing failed: REASON" when a write fails; exceptions of `write` pass
 // through.

@@ -9,5 +9,7 @@ void AddSnpInfoCommand(CLI::App& snp);
 void AddSnpExportCommand(CLI::App& snp);
 void AddSnpPlotCommand(CLI::App& snp);
 void AddSnpResampleCommand(CLI::App& snp);
+void AddSnpConvertCommand(CLI::App& snp);
+void AddSnpDiffCommand(CLI::App& snp);
 
 }  // namespace lumenutil

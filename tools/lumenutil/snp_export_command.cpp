@@ -4,6 +4,7 @@
 #include <string>
 #include <vector>
 
+#include "lumenutil/noise_records.h"
 #include "lumenutil/snp_command_io.h"
 #include "lumenutil/snp_commands.h"
 #include "lumenutil/snp_file.h"
@@ -20,10 +21,17 @@ struct ExportOptions {
   std::string output;
   int ports = 0;
   int limit = 0;
+  bool noise = false;
 };
 
 void WriteTable(const ExportOptions& options, std::ostream& out) {
   const CSnPFileBase file = ReadTouchstone(options.path, options.ports);
+  if (options.noise) {
+    WriteNoiseTable(RequireNoiseRecords(file, options.path), file.GetResultType(),
+                    options.delimiter, options.limit, out);
+    if (!out) throw std::runtime_error("writing the table failed");
+    return;
+  }
   const SnPFileInfo& info = file.GetFileInfo();
   const TraceFormat format = TraceFormatFromName(options.format);
   if (info.parameter != 'S' &&
@@ -79,14 +87,20 @@ void AddSnpExportCommand(CLI::App& snp) {
       "per stimulus point, numbers with enough digits to read back exactly");
   auto options = std::make_shared<ExportOptions>();
   command->add_option("FILE", options->path, "Touchstone file")->required();
-  command->add_option("--params,-p", options->params,
-                      "comma-separated traces, e.g. S21,S11 (default: all, in file order)");
+  CLI::Option* params =
+      command->add_option("--params,-p", options->params,
+                          "comma-separated traces, e.g. S21,S11 (default: all, in file order)");
+  CLI::Option* format =
+      command->add_option("--format,-f", options->format,
+                          "ri, ma (linear magnitude, degrees), db (dB, degrees), logmag, phase, "
+                          "uphase (unwrapped), swr, z (ohms), y (siemens)");
+  format->check(CLI::IsMember(TraceFormatNames()))->capture_default_str();
   command
-      ->add_option("--format,-f", options->format,
-                   "ri, ma (linear magnitude, degrees), db (dB, degrees), logmag, phase, "
-                   "uphase (unwrapped), swr, z (ohms), y (siemens)")
-      ->check(CLI::IsMember(TraceFormatNames()))
-      ->capture_default_str();
+      ->add_flag("--noise", options->noise,
+                 "the noise records instead: frequency, NFmin (dB), |GammaOpt|, its angle "
+                 "(degrees) and Rn (ohms)")
+      ->excludes(params)
+      ->excludes(format);
   command->add_option("--delimiter,-d", options->delimiter, "column separator")
       ->capture_default_str();
   command->add_option("--limit,-n", options->limit, "only the first N points")

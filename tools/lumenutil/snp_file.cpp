@@ -166,4 +166,17 @@ std::string WithUnit(double value, const std::string& unit, bool siPrefix, int d
   return text + unit;
 }
 
+std::string Rounded(double value, int digits) {
+  char text[32];
+  std::snprintf(text, sizeof text, "%.*g", digits, value);
+  return text;
+}
+
+std::string LowerAscii(std::string text) {
+  for (char& c : text) {
+    if (c >= 'A' && c <= 'Z') c = static_cast<char>(c - 'A' + 'a');
+  }
+  return text;
+}
+
 }  // namespace lumenutil

@@ -63,4 +63,9 @@ StimulusAxis AxisOf(ResultType type);
 // as "1.5 GHz"; without a prefix when `siPrefix` is false ("-10 dBm").
 std::string WithUnit(double value, const std::string& unit, bool siPrefix, int digits = 6);
 
+// `value` with at most `digits` significant digits, for tables people read ("0.1", "-3.5e-05").
+std::string Rounded(double value, int digits = 6);
+// `text` in ASCII lower case ("Frequency" becomes "frequency").
+std::string LowerAscii(std::string text);
+
 }  // namespace lumenutil

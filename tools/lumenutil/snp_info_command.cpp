@@ -1,7 +1,10 @@
+#include <cstdio>
 #include <iostream>
 #include <memory>
 #include <string>
+#include <vector>
 
+#include "lumenutil/noise_records.h"
 #include "lumenutil/snp_command_io.h"
 #include "lumenutil/snp_commands.h"
 #include "lumenutil/snp_file.h"
@@ -33,6 +36,23 @@ const char* MatrixName(SnPMatrixFormat format) {
       return "upper triangle";
     default:
       return "full";
+  }
+}
+
+// One line per noise record under the "noise data" line, in columns.
+void PrintNoiseRecords(const std::vector<NoiseRecord>& records, const StimulusAxis& axis,
+                       std::ostream& out) {
+  const auto row = [&out](const std::string& x, const std::string& nf, const std::string& mag,
+                          const std::string& deg, const std::string& rn) {
+    char line[160];
+    std::snprintf(line, sizeof line, "             %-14s %-12s %-12s %-12s %s\n", x.c_str(),
+                  nf.c_str(), mag.c_str(), deg.c_str(), rn.c_str());
+    out << line;
+  };
+  row(LowerAscii(axis.quantity), "NFmin (dB)", "|GammaOpt|", "angle (deg)", "Rn (ohm)");
+  for (const NoiseRecord& r : records) {
+    row(WithUnit(r.stimulus, axis.unit, axis.siPrefix), Rounded(r.nfMinDb), Rounded(r.gammaMag),
+        Rounded(r.gammaDeg), Rounded(r.rnOhm));
   }
 }
 
@@ -80,6 +100,7 @@ void PrintInfo(const InfoOptions& options) {
   out << "noise data   ";
   if (info.noisePoints > 0) {
     out << info.noisePoints << " points (NFmin, GammaOpt, Rn)\n";
+    PrintNoiseRecords(NoiseRecords(file), axis, out);
   } else {
     out << "none\n";
   }

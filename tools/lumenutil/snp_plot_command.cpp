@@ -4,6 +4,7 @@
 #include <string>
 #include <vector>
 
+#include "lumenutil/noise_records.h"
 #include "lumenutil/snp_command_io.h"
 #include "lumenutil/snp_commands.h"
 #include "lumenutil/snp_file.h"
@@ -44,8 +45,26 @@ ChartSeries BreakAtWraps(ChartSeries s) {
   return out;
 }
 
+std::string RenderNoiseFigure(const PlotOptions& options, const CSnPFileBase& file) {
+  ChartSeries nf{"NFmin", {}, {}};
+  for (const NoiseRecord& r : RequireNoiseRecords(file, options.path)) {
+    nf.x.push_back(r.stimulus);
+    nf.y.push_back(r.nfMinDb);
+  }
+  const StimulusAxis axis = AxisOf(file.GetResultType());
+  CartesianChart chart;
+  chart.title = BaseName(options.path) + ": minimum noise figure";
+  chart.xQuantity = axis.quantity;
+  chart.xUnit = axis.unit;
+  chart.xSiPrefix = axis.siPrefix;
+  chart.yLabel = "NFmin (dB)";
+  chart.series.push_back(std::move(nf));
+  return RenderCartesianSvg(chart);
+}
+
 std::string Render(const PlotOptions& options) {
   const CSnPFileBase file = ReadTouchstone(options.path, options.ports);
+  if (options.format == "nf") return RenderNoiseFigure(options, file);
   std::vector<MatrixPosition> positions = SelectPositions(options.params, file);
   if (options.format == "smith" && options.params.empty()) {
     // A Smith chart shows reflections; transmissions would only cross it.
@@ -106,8 +125,10 @@ void AddSnpPlotCommand(CLI::App& snp) {
   auto options = std::make_shared<PlotOptions>();
   command->add_option("FILE", options->path, "Touchstone file")->required();
   command->add_option("--output,-o", options->output, "SVG file to write")->required();
-  command->add_option("--format,-f", options->format, "logmag, phase or smith")
-      ->check(CLI::IsMember({"logmag", "phase", "smith"}))
+  command
+      ->add_option("--format,-f", options->format,
+                   "logmag, phase, smith, or nf (minimum noise figure of the noise data)")
+      ->check(CLI::IsMember({"logmag", "phase", "smith", "nf"}))
       ->capture_default_str();
   command->add_option("--params,-p", options->params,
                       "comma-separated traces, e.g. S21,S11 (default: all; for smith, the "

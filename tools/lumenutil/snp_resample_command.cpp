@@ -9,8 +9,8 @@
 #include "lumenutil/snp_command_io.h"
 #include "lumenutil/snp_commands.h"
 #include "lumenutil/snp_file.h"
+#include "lumenutil/touchstone_output.h"
 #include "lumenutil/trace_carrier.h"
-#include "lumenutil/touchstone_writer.h"
 
 using LumenUtility::InputArray;
 
@@ -24,6 +24,7 @@ struct ResampleOptions {
   int points = 0;
   bool log = false;
   bool holdEnds = false;
+  int version = 1;
   std::string output;
   int ports = 0;
 };
@@ -57,11 +58,7 @@ void Resample(const ResampleOptions& options) {
   if (options.log && (start <= 0 || stop <= 0)) {
     throw std::runtime_error("a logarithmic sweep needs --start and --stop above 0");
   }
-  const int outputPorts = SnPPortCountFromFileName(LumenUtility::Utf8ToWide(options.output));
-  if (outputPorts > 0 && outputPorts != file.GetSNPType()) {
-    throw std::runtime_error(options.output + " names " + std::to_string(outputPorts) +
-                             " ports, but the network has " + std::to_string(file.GetSNPType()));
-  }
+  CheckOutputPorts(options.output, file);
   const CSNParameter& s11 = file.GetParam(SNP_S11);
   if (s11.GetNumPoints() == 0) throw std::runtime_error(options.path + ": no data points");
   RequireAscendingStimulus(file, options.path);
@@ -83,17 +80,20 @@ void Resample(const ResampleOptions& options) {
       (options.log ? " logarithmic" : " linear") + " points, " +
       WithUnit(start, axis.unit, axis.siPrefix) + " to " +
       WithUnit(stop, axis.unit, axis.siPrefix) + (options.holdEnds ? ", end values held" : "");
-  WriteOutputFile(options.output,
-                  [&](std::ostream& out) { WriteTouchstoneV1(file, comment, out, std::cerr); });
+  LumenUtility::TouchstoneWriteOptions write;  // RI, Hz
+  write.version = options.version;
+  write.comment = comment;
+  WriteTouchstoneFile(file, write, options.output, "snp resample", true);
 }
 
 }  // namespace
 
 void AddSnpResampleCommand(CLI::App& snp) {
-  CLI::App* command =
-      snp.add_subcommand("resample",
-                         "Carry every trace of a Touchstone file onto a new linear or logarithmic "
-                         "sweep by circular interpolation and write a Touchstone version 1 file");
+  CLI::App* command = snp.add_subcommand(
+      "resample",
+      "Carry every trace of a Touchstone file onto a new linear or logarithmic "
+      "sweep by circular interpolation and write a Touchstone file (version 1 unless "
+      "--version 2), real-imaginary in Hz");
   auto options = std::make_shared<ResampleOptions>();
   command->add_option("FILE", options->path, "Touchstone file")->required();
   command->add_option("--start", options->start, "first stimulus value, e.g. 1.5e9, 1.5G or 1.5GHz")
@@ -109,6 +109,9 @@ void AddSnpResampleCommand(CLI::App& snp) {
                     "where the sweep reaches beyond the file, hold each trace's end values");
   command->add_option("--output,-o", options->output, "Touchstone file to write (OUT.sNp)")
       ->required();
+  command->add_option("--version", options->version, "Touchstone version written: 1 or 2 (2.0)")
+      ->check(CLI::IsMember({1, 2}))
+      ->capture_default_str();
   AddPortsOption(*command, options->ports);
   command->callback([options] { Resample(*options); });
 }

@@ -3,12 +3,6 @@
 # reader the very numbers it started from. Usage: snp_resample_test.sh LUMENUTIL SOURCE_DIR
 set -uo pipefail
 source "$(dirname "$0")/tool_test_common.sh"
-same_export() {  # same_export A B [export options...]: identical RI tables
-  local a=$1 b=$2
-  shift 2
-  diff <("$tool" snp export "$a" -f ri "$@") <("$tool" snp export "$b" -f ri "$@") >"$work/diff" ||
-    fail "$a and $b differ:"$'\n'"$(head -n 5 "$work/diff")"
-}
 
 # Three ports (rows of pairs over several lines) and awkward values survive the round trip.
 cat >"$work/three.ts" <<'TS'

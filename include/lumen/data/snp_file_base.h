@@ -5,7 +5,8 @@
 // Reading fills one trace per matrix position, named "S11", "S21", ... ("S10_1" and the like
 // past nine ports), all on the file's stimulus points in Hz (or in the file's own unit when
 // it holds seconds, dBm or point numbers, see GetResultType). Two-port noise data adds
-// three custom traces. A failed read leaves the object as it was and says why in
+// three custom traces, one value per noise record on the records' own stimulus points (in
+// the unit of the network data). A failed read leaves the object as it was and says why in
 // GetReadError. Thread-safety: confine each object to one thread. A copyable value.
 #pragma once
 
