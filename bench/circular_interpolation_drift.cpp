@@ -70,8 +70,11 @@ std::vector<TsComplex> Data(std::mt19937& rng, const std::vector<double>& x) {
     const double re = 1 / (1 + detune * detune), im = -detune * re;
     const double phase = -2 * kPi * (x[k] - x.front()) * tau;
     const double c = std::cos(phase), s = std::sin(phase);
-    d[k] = TsComplex(level * (0.3 + 0.6 * (re * c - im * s)) + noise(rng),
-                     level * 0.6 * (re * s + im * c) + noise(rng));
+    // The two draws in sequence, so that every compiler makes the same traces.
+    const double noiseRe = noise(rng);
+    const double noiseIm = noise(rng);
+    d[k] = TsComplex(level * (0.3 + 0.6 * (re * c - im * s)) + noiseRe,
+                     level * 0.6 * (re * s + im * c) + noiseIm);
   }
   return d;
 }
@@ -166,6 +169,7 @@ int Compare(const char* path) {
   double largest = 0.0;
   const char* names[] = {"mag/phase", "circular", "circular, no phase fit"};
   double largestOfType[3] = {0, 0, 0};
+  std::size_t largestTrace = 0, largestPoint = 0, traceIndex = 0;
   std::size_t changedOfType[3] = {0, 0, 0};
   for (const Trace& trace : Traces()) {
     const std::vector<TsComplex> out = Resample(trace);
@@ -184,13 +188,19 @@ int Compare(const char* path) {
       ++changedOfType[type];
       const double scale = std::max(before.Mag(), 1e-30);
       const double change = (out[k] - before).Mag() / scale;
-      if (!(change <= largest)) largest = change;
+      if (!(change <= largest)) {
+        largest = change;
+        largestTrace = traceIndex;
+        largestPoint = k;
+      }
       if (!(change <= largestOfType[type])) largestOfType[type] = change;
     }
     offset += bytes;
+    ++traceIndex;
   }
   std::printf("%zu values, %zu changed (%.3f %%), largest change %.3g of the magnitude\n", values,
               changed, 100.0 * changed / values, largest);
+  std::printf("  largest at trace %zu, point %zu\n", largestTrace, largestPoint);
   for (int t = 0; t < 3; ++t) {
     std::printf("  %-24s %8zu changed, largest %.3g\n", names[t], changedOfType[t],
                 largestOfType[t]);
