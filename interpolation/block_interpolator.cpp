@@ -11,11 +11,11 @@ BlockInterpolator::BlockInterpolator(int n, const double* x, const TsComplex* d,
     : m_n(n), m_x(x), m_d(d), m_type(type), m_lead(lead), m_trig(TrigTable::Get()) {}
 
 void BlockInterpolator::Evaluate(int count, const int* interval, const double* value,
-                                 const bool* wanted, const bool* magnitudeOnly, TsComplex* out,
-                                 double* magnitude) {
+                                 const double* t, const bool* wanted, const bool* magnitudeOnly,
+                                 TsComplex* out, double* magnitude) {
   FindSlots(count, interval, wanted);
   BuildArcs();
-  EvaluateOnArcs(count, value, wanted);
+  EvaluateOnArcs(count, t, wanted);
   EvaluateOnLines(count, value, wanted, magnitudeOnly, magnitude);
   for (int j = 0; j < count; ++j) {
     if (!wanted[j]) continue;
@@ -74,15 +74,13 @@ void BlockInterpolator::BuildArcs() {
   }
 }
 
-void BlockInterpolator::EvaluateOnArcs(int count, const double* value, const bool* wanted) {
+void BlockInterpolator::EvaluateOnArcs(int count, const double* t, const bool* wanted) {
   for (int j = 0; j < count; ++j) {
     m_onArc[j] = false;
     if (!wanted[j]) continue;
     const int s = m_slotOf[j];
     if (!m_arcUsable[s]) continue;
-    const int i = m_slotInterval[s];
-    const double t = (value[j] - m_x[i - 1]) / (m_x[i] - m_x[i - 1]);
-    const double theta = t * m_step[s];
+    const double theta = t[j] * m_step[s];
     if (!(std::fabs(theta) > kMinimumArcStep)) continue;
     m_value[j] = RotateOnArc(m_arc[s], m_start[s], theta, m_trig);
     m_onArc[j] = true;

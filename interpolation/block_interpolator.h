@@ -30,18 +30,19 @@ class BlockInterpolator {
   BlockInterpolator& operator=(const BlockInterpolator&) = delete;
 
   // For each of `count` (<= kMaxPoints) points j with wanted[j]: the value at stimulus
-  // value[j] (beyond the interval it extrapolates) of old interval interval[j] (1 .. n - 1),
+  // value[j] (beyond the interval it extrapolates) of old interval i = interval[j]
+  // (1 .. n - 1), whose share of the interval t[j] = (value[j] - x[i - 1]) / (x[i] - x[i - 1]),
   // written to out[j], or where magnitudeOnly[j] only its magnitude, to magnitude[j]. Off the
   // arc the magnitude is read from the magnitude line, without the turn: rotating changes the
   // value's magnitude only by rounding its parts to float (less than 1.2e-7 of it).
-  void Evaluate(int count, const int* interval, const double* value, const bool* wanted,
-                const bool* magnitudeOnly, TsComplex* out, double* magnitude);
+  void Evaluate(int count, const int* interval, const double* value, const double* t,
+                const bool* wanted, const bool* magnitudeOnly, TsComplex* out, double* magnitude);
 
  private:
   // The old interval of each slot, and whether its three points are evenly spaced.
   void FindSlots(int count, const int* interval, const bool* wanted);
   void BuildArcs();
-  void EvaluateOnArcs(int count, const double* value, const bool* wanted);
+  void EvaluateOnArcs(int count, const double* t, const bool* wanted);
   void EvaluateOnLines(int count, const double* value, const bool* wanted,
                        const bool* magnitudeOnly, double* magnitude);
 

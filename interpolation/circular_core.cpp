@@ -36,6 +36,9 @@ struct Block {
   // Upper index of the old interval that strictly holds the point (or 1 below the old range,
   // n - 1 above it), as the phase fit's search would find it; 0 where that is not known.
   int fitInterval[kSize];
+  // Share of the interval at the point: (value - x[i - 1]) / (x[i] - x[i - 1]), for computed
+  // points; the circle's rotation and the phase fit's blend both use it.
+  double t[kSize];
   bool fitted[kSize];
   double psi[kSize];
   double magnitude[kSize];
@@ -95,6 +98,7 @@ int ResamplePass(int n, const double* x, const TsComplex* d, bool ordered,
       block.copied[j] = found;
       block.computed[j] = !found;
       block.fitInterval[j] = found || !inside ? 0 : i;
+      if (!found) block.t[j] = (v - x[i - 1]) / (x[i] - x[i - 1]);
       lowest = std::min(lowest, i);
       highest = std::max(highest, i);
       copied += found;
@@ -103,13 +107,13 @@ int ResamplePass(int n, const double* x, const TsComplex* d, bool ordered,
       fit->Prepare(lowest - 1, highest + 1);
       for (int j = 0; j < count; ++j) {
         const int upper = block.fitInterval[j];
-        block.fitted[j] = upper > 0 ? fit->PhaseBetween(upper, value[j], block.psi[j])
+        block.fitted[j] = upper > 0 ? fit->PhaseBetween(upper, value[j], block.t[j], block.psi[j])
                                     : fit->PhaseAt(value[j], block.psi[j]);
       }
     } else {
       std::fill(block.fitted, block.fitted + count, false);
     }
-    interpolator.Evaluate(count, block.interval, value, block.computed, block.fitted, out,
+    interpolator.Evaluate(count, block.interval, value, block.t, block.computed, block.fitted, out,
                           block.magnitude);
     for (int j = 0; j < count; ++j) {
       if (!block.copied[j]) continue;

@@ -35,9 +35,10 @@ class PhaseFit {
   bool PhaseAt(double value, double& psi);
 
   // PhaseAt for a value known to lie strictly between x[upper - 1] and x[upper], or below x[0]
-  // with upper = 1, or above x[n - 1] with upper = n - 1; saves the search. Precondition
-  // n >= 3.
-  bool PhaseBetween(std::ptrdiff_t upper, double value, double& psi);
+  // with upper = 1, or above x[n - 1] with upper = n - 1, whose share of that interval
+  // (value - x[upper - 1]) / (x[upper] - x[upper - 1]) is `share`; saves the search and the
+  // division. Precondition n >= 3.
+  bool PhaseBetween(std::ptrdiff_t upper, double value, double share, double& psi);
 
   // Makes, in one run, the fits of old points first .. last that are not made yet (at most
   // 256, else nothing): fits made one after the other overlap in the processor, where fits

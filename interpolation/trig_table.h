@@ -4,8 +4,11 @@
 // below the float precision of the data they serve.
 #pragma once
 
+#include <cfloat>
 #include <cmath>
 #include <cstdint>
+
+#include "lumen/core/ts_complex.h"
 
 namespace LumenUtility {
 
@@ -37,6 +40,20 @@ class TrigTable {
     // The table value plus a small correction, which keeps the rounding error near half a unit.
     s = e.sin + (e.cos * sinR - e.sin * oneMinusCosR);
     c = e.cos - (e.sin * sinR + e.cos * oneMinusCosR);
+  }
+
+  // The angle of v in (-pi, pi] as TsComplex::Phase gives it (atan2(im, re), with +-pi/2 by
+  // the sign test im >= 0 where re is 0).
+  double Angle(TsComplex v) const {
+    if (v.re == 0.0f) return v.Phase();
+    const double y = v.im, x = v.re;
+    const double u = y / x;
+    // Finite for finite parts; infinities and NaN go to the library.
+    if (!(std::fabs(u) <= DBL_MAX)) return std::atan2(y, x);
+    const double a = Atan(u);
+    if (x > 0.0) return a;
+    // Left half-plane: half a turn towards the side y is on (a -0 imaginary part is below).
+    return std::signbit(y) ? (a - kPiHigh) - kPiLow : (a + kPiHigh) + kPiLow;
   }
 
   // atan(u) in [-pi/2, pi/2]; atan(+-infinity) = +-pi/2, NaN stays NaN.
@@ -78,6 +95,9 @@ class TrigTable {
   // pi/2 = kHalfPiHigh + kHalfPiLow.
   static constexpr double kHalfPiHigh = 0x1.921fb54442d18p+0;
   static constexpr double kHalfPiLow = 0x1.1a62633145c07p-54;
+  // pi = kPiHigh + kPiLow.
+  static constexpr double kPiHigh = 0x1.921fb54442d18p+1;
+  static constexpr double kPiLow = 0x1.1a62633145c07p-53;
 
   struct Entry {
     double sin;
