@@ -1,7 +1,8 @@
 // Sine, cosine and arc tangent for the resampling loops, from small tables and short
-// polynomials: inline, branch-light and several times cheaper than the library calls, with
-// errors of about one unit in the last place of a double (the library's are below one), far
-// below the float precision of the data they serve.
+// polynomials: inline, branch-light, without divisions (but for arguments beyond 1 of the
+// arc tangent) and several times cheaper than the library calls, with errors of about one
+// unit in the last place of a double (the library's are below one), far below the float
+// precision of the data they serve.
 #pragma once
 
 #include <cfloat>
@@ -12,7 +13,8 @@
 
 namespace LumenUtility {
 
-// Tables of sin and cos at 256 steps around the circle and of atan at 129 points of [0, 1].
+// Tables of sin and cos at 256 steps around the circle and of atan with its first derivatives
+// at 129 points of [0, 1] (13 KB).
 // Thread-safety: immutable once built; Get() builds the one instance on first use (thread-safe)
 // and callers on any thread share it.
 class TrigTable {
@@ -47,10 +49,16 @@ class TrigTable {
   double Angle(TsComplex v) const {
     if (v.re == 0.0f) return v.Phase();
     const double y = v.im, x = v.re;
-    const double u = y / x;
+    // One division either way: the smaller part over the larger.
+    const bool steep = std::fabs(y) > std::fabs(x);
+    const double u = steep ? x / y : y / x;
     // Finite for finite parts; infinities and NaN go to the library.
-    if (!(std::fabs(u) <= DBL_MAX)) return std::atan2(y, x);
-    const double a = Atan(u);
+    if (!(std::fabs(u) <= 1.0)) return std::atan2(y, x);
+    const double a = AtanInUnit(u);
+    if (steep) {
+      // atan2 = +-pi/2 - atan(x / y), the sign that of y.
+      return std::signbit(y) ? (-kHalfPiHigh - a) - kHalfPiLow : (kHalfPiHigh - a) + kHalfPiLow;
+    }
     if (x > 0.0) return a;
     // Left half-plane: half a turn towards the side y is on (a -0 imaginary part is below).
     return std::signbit(y) ? (a - kPiHigh) - kPiLow : (a + kPiHigh) + kPiLow;
@@ -60,24 +68,31 @@ class TrigTable {
   double Atan(double u) const {
     const double a = std::fabs(u);
     // Beyond 1, atan(a) = pi/2 - atan(1/a); pi/2 in two parts keeps the difference exact.
-    const bool reflected = a > 1.0;
-    const double v = reflected ? 1.0 / a : a;
-    // atan(v) = atan(c) + atan(r) with c = j / 128 the nearest table point and
-    // r = (v - c) / (1 + v c), |r| <= 1/256.
-    const double j = RoundToInteger(v * kAtanSteps);
-    const double c = j * (1.0 / kAtanSteps);
-    const double r = (v - c) / (1.0 + v * c);
-    const double r2 = r * r;
-    const double atanR = r - r * r2 * (1.0 / 3 - r2 * (1.0 / 5 - r2 * (1.0 / 7)));
-    // A NaN index reads entry 0; the NaN still reaches the result through r.
-    const double atanC = m_atan[j >= 0.0 && j <= kAtanSteps ? static_cast<int>(j) : 0];
-    const double folded = atanC + atanR;
-    const double result = reflected ? (kHalfPiHigh - folded) + kHalfPiLow : folded;
-    return std::signbit(u) ? -result : result;
+    if (a > 1.0) {
+      const double result = (kHalfPiHigh - AtanInUnit(1.0 / a)) + kHalfPiLow;
+      return std::signbit(u) ? -result : result;
+    }
+    return AtanInUnit(u);
   }
 
  private:
   TrigTable();
+
+  // atan(u) for |u| <= 1 (NaN stays NaN).
+  double AtanInUnit(double u) const {
+    const double v = std::fabs(u);
+    // atan(v) = atan(c + e) with c = j / 128 the nearest table point, as the Taylor series
+    // about c: with |e| <= 1/256 the terms beyond e^7 are below 1e-20. e is exact.
+    const double j = RoundToInteger(v * kAtanSteps);
+    const double e = v - j * (1.0 / kAtanSteps);
+    // A NaN index reads entry 0; the NaN still reaches the result through e.
+    const AtanEntry& t = m_atan[j >= 0.0 && j <= kAtanSteps ? static_cast<int>(j) : 0];
+    const double series =
+        e * (t.d[0] +
+             e * (t.d[1] + e * (t.d[2] + e * (t.d[3] + e * (t.d[4] + e * (t.d[5] + e * t.d[6]))))));
+    const double result = t.atan + series;
+    return std::signbit(u) ? -result : result;
+  }
 
   // The integer nearest to x (ties to even), for |x| below 2^51, in the default rounding mode.
   static double RoundToInteger(double x) {
@@ -103,8 +118,13 @@ class TrigTable {
     double sin;
     double cos;
   };
-  Entry m_sinCos[kSteps];         // at k * 2 pi / 256
-  double m_atan[kAtanSteps + 1];  // at j / 128
+  // atan and its Taylor coefficients d[k - 1] = atan^(k)(c) / k!, k = 1 .. 7, at c.
+  struct AtanEntry {
+    double atan;
+    double d[7];
+  };
+  Entry m_sinCos[kSteps];            // at k * 2 pi / 256
+  AtanEntry m_atan[kAtanSteps + 1];  // at c = j / 128
 };
 
 }  // namespace LumenUtility
