@@ -57,32 +57,39 @@ struct Arc {
   double Turn12(const TrigTable& trig) const { return trig.Atan(cross12 / std::fabs(dot12)); }
 };
 
-// Defined here rather than out of line: the resampling builds arcs for a block of intervals
-// in one loop, which the processor overlaps only when nothing in it is a call.
-inline Arc ArcThrough(TsComplex p0, TsComplex p1, TsComplex p2) {
-  constexpr double kNudge = 1.1920928955078125e-07;  // FLT_EPSILON
-  const double a0 = p0.re, b0 = p0.im, a1 = p1.re, a2 = p2.re;
-  double b1 = p1.im, b2 = p2.im;
-  // Midpoints of the chords P0P1 and P1P2, from the points as given.
-  const double s01 = (b1 + b0) / 2, u01 = (a1 + a0) / 2;
-  const double s12 = (b2 + b1) / 2, u12 = (a2 + a1) / 2;
-  // The perpendicular bisectors y = m x + c of both chords; a horizontal chord would make its
-  // bisector vertical, so its end is lifted by FLT_EPSILON.
-  if (std::fabs(b1 - b0) < kNudge) b1 = b0 + kNudge;
-  const double m1 = (a0 - a1) / (b1 - b0);
-  if (std::fabs(b2 - b1) < kNudge) b2 = b1 + kNudge;
-  double m2 = (a1 - a2) / (b2 - b1);
-  const double c1 = s01 - m1 * u01;
-  const double c2 = s12 - m2 * u12;
-  if (std::fabs(m2 - m1) < kNudge) m2 = m1 + kNudge;
+// The perpendicular bisector y = m x + c of the chord from P = (ap, bp) to Q = (aq, bq), and
+// 1 / m. Neighbouring circles of a sweep share a chord, and so its bisector; one whose
+// imaginary parts lie within FLT_EPSILON (`nudged`) is not shared, as each circle lifts its
+// end differently.
+struct Bisector {
+  double m = 0.0;
+  double c = 0.0;
+  double inverse = 0.0;
+  bool nudged = true;
+};
 
-  // Where the bisectors cross. The reciprocals are taken side by side rather than one after
-  // the other: the divisions are most of this function's time.
-  const double inverseM1 = 1.0 / m1;
+inline constexpr double kArcNudge = 1.1920928955078125e-07;  // FLT_EPSILON
+
+inline Bisector BisectorOf(TsComplex p, TsComplex q) {
+  const double ap = p.re, bp = p.im, aq = q.re, bq = q.im;
+  Bisector bisector;
+  bisector.m = (ap - aq) / (bq - bp);
+  bisector.c = (bq + bp) / 2 - bisector.m * ((aq + ap) / 2);
+  bisector.inverse = 1.0 / bisector.m;
+  bisector.nudged = !(std::fabs(bq - bp) >= kArcNudge);
+  return bisector;
+}
+
+// The arc through P0, P1, P2 (imaginary parts b1 and b2 as lifted) from the bisectors of its
+// chords P0P1 (m1, c1, inverseM1 = 1 / m1) and P1P2 (m2, c2).
+inline Arc ArcFromBisectors(double m1, double c1, double inverseM1, double m2, double c2, double a0,
+                            double b0, double a1, double b1, double a2, double b2) {
+  if (std::fabs(m2 - m1) < kArcNudge) m2 = m1 + kArcNudge;
+  // Where the bisectors cross.
   const double inverseSpread = 1.0 / (m1 - m2);
   Arc arc;
   arc.cy = (c2 * m1 - c1 * m2) * inverseSpread;
-  arc.cx = std::fabs(m1) >= kNudge ? (arc.cy - c1) * inverseM1 : (c1 - c2) / m2;
+  arc.cx = std::fabs(m1) >= kArcNudge ? (arc.cy - c1) * inverseM1 : (c1 - c2) / m2;
   arc.w0 = TsComplex(a0 - arc.cx, b0 - arc.cy);
   arc.w1 = TsComplex(a1 - arc.cx, b1 - arc.cy);
   const TsComplex w2(a2 - arc.cx, b2 - arc.cy);
@@ -96,6 +103,25 @@ inline Arc ArcThrough(TsComplex p0, TsComplex p1, TsComplex p2) {
   arc.dot01 = dot(arc.w0, arc.w1);
   arc.dot12 = dot(arc.w1, w2);
   return arc;
+}
+
+// Defined here rather than out of line: the resampling builds arcs for a block of intervals
+// in one loop, which the processor overlaps only when nothing in it is a call.
+inline Arc ArcThrough(TsComplex p0, TsComplex p1, TsComplex p2) {
+  const double a0 = p0.re, b0 = p0.im, a1 = p1.re, a2 = p2.re;
+  double b1 = p1.im, b2 = p2.im;
+  // Midpoints of the chords P0P1 and P1P2, from the points as given.
+  const double s01 = (b1 + b0) / 2, u01 = (a1 + a0) / 2;
+  const double s12 = (b2 + b1) / 2, u12 = (a2 + a1) / 2;
+  // The perpendicular bisectors y = m x + c of both chords; a horizontal chord would make its
+  // bisector vertical, so its end is lifted by FLT_EPSILON.
+  if (std::fabs(b1 - b0) < kArcNudge) b1 = b0 + kArcNudge;
+  const double m1 = (a0 - a1) / (b1 - b0);
+  if (std::fabs(b2 - b1) < kArcNudge) b2 = b1 + kArcNudge;
+  const double m2 = (a1 - a2) / (b2 - b1);
+  const double c1 = s01 - m1 * u01;
+  const double c2 = s12 - m2 * u12;
+  return ArcFromBisectors(m1, c1, 1.0 / m1, m2, c2, a0, b0, a1, b1, a2, b2);
 }
 
 // v * (cos theta + j sin theta), with cos and sin rounded to float as TsComplex holds them and

@@ -45,8 +45,10 @@ void BlockInterpolator::FindSlots(int count, const int* interval, const bool* wa
     m_even[s] = false;
     if (m_type == INTERP_MAG_PHASE) continue;
     double x0, x1, x2;
+    m_first[s] = -1;
     if (m_n >= 3) {
       const int first = i == m_n - 1 ? i - 2 : i - 1;
+      m_first[s] = first;
       x0 = m_x[first], x1 = m_x[first + 1], x2 = m_x[first + 2];
       m_triple[s][0] = m_d[first], m_triple[s][1] = m_d[first + 1];
       m_triple[s][2] = m_d[first + 2];
@@ -62,8 +64,27 @@ void BlockInterpolator::FindSlots(int count, const int* interval, const bool* wa
 }
 
 void BlockInterpolator::BuildArcs() {
+  // The bisector of each slot's second chord P1P2; the first chord P0P1 is the second of the
+  // slot before when that circle starts one old point earlier, as in a sweep.
   for (int s = 0; s < m_slots; ++s) {
-    if (m_even[s]) m_arc[s] = ArcThrough(m_triple[s][0], m_triple[s][1], m_triple[s][2]);
+    if (m_even[s]) m_second[s] = BisectorOf(m_triple[s][1], m_triple[s][2]);
+  }
+  for (int s = 0; s < m_slots; ++s) {
+    if (!m_even[s]) continue;
+    const bool shared =
+        s > 0 && m_even[s - 1] && m_first[s] >= 0 && m_first[s] == m_first[s - 1] + 1;
+    m_firstChord[s] = shared ? m_second[s - 1] : BisectorOf(m_triple[s][0], m_triple[s][1]);
+  }
+  for (int s = 0; s < m_slots; ++s) {
+    if (!m_even[s]) continue;
+    const Bisector& first = m_firstChord[s];
+    const Bisector& second = m_second[s];
+    const TsComplex(&p)[3] = m_triple[s];
+    // Either chord lifted: the circle as ArcThrough lifts it.
+    m_arc[s] = first.nudged || second.nudged
+                   ? ArcThrough(p[0], p[1], p[2])
+                   : ArcFromBisectors(first.m, first.c, first.inverse, second.m, second.c, p[0].re,
+                                      p[0].im, p[1].re, p[1].im, p[2].re, p[2].im);
   }
   for (int s = 0; s < m_slots; ++s) {
     m_arcUsable[s] = m_even[s] && m_arc[s].TurnsAboveMinimum();

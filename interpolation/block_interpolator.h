@@ -57,7 +57,10 @@ class BlockInterpolator {
   int m_slots = 0;
   int m_slotInterval[kMaxPoints];
   TsComplex m_triple[kMaxPoints][3];
+  int m_first[kMaxPoints];  // old index of the triple's first point; -1 for the lead point
   bool m_even[kMaxPoints];
+  Bisector m_firstChord[kMaxPoints];  // of P0P1
+  Bisector m_second[kMaxPoints];      // of P1P2
   Arc m_arc[kMaxPoints];
   bool m_arcUsable[kMaxPoints];
   double m_step[kMaxPoints];      // turn across the interval, radians
