@@ -3,6 +3,7 @@
 #include <cmath>
 #include <cstddef>
 
+#include "core/phase_unwrap.h"
 #include "lumen/platform/error_codes.h"
 #include "lumen/platform/lumen_exception.h"
 #include "lumen/stimulus/input_array.h"
@@ -11,9 +12,6 @@ namespace LumenUtility {
 
 namespace {
 
-constexpr double kPi = 3.141592653589793;
-constexpr double kTwoPi = 6.283185307179586;
-constexpr double kInvTwoPi = 0.15915494309189535;
 constexpr double kHalfPi = 1.5707963267948966;
 
 }  // namespace
@@ -107,35 +105,7 @@ std::int32_t FormatUnwrappedPhase(const TsComplex* data, float* phase, int begin
   if (begin == end) return S_OK;
   if (data == nullptr || phase == nullptr) return E_INVALIDARG;
 
-  // Whole turns already added by the earlier pieces. Truncating their net phase change can
-  // come out one turn short or long; the first new point absorbs that below.
-  double turns = 0.0;
-  if (begin > 1) {
-    turns = std::trunc((double{phase[begin - 1]} - phase[0]) * kInvTwoPi);
-    if (!std::isfinite(turns)) turns = 0.0;
-  }
-
-  for (int i = begin; i < end; ++i) {
-    const double principal = data[i].Phase();
-    const double phi = principal + turns * kTwoPi;
-    if (i > 0) {
-      const double d = phi - phase[i - 1];
-      if (d < -kPi) {
-        turns += 1.0;
-      } else if (d > kPi) {
-        turns -= 1.0;
-      }
-      // Past the first point neighbouring principal phases differ by less than 2 pi, so one
-      // turn always suffices; only a misestimated starting turn count needs more.
-      if (i == begin && std::isfinite(d)) {
-        const double rest = principal + turns * kTwoPi - phase[i - 1];
-        if (std::abs(rest) > kPi) turns += std::round(-rest * kInvTwoPi);
-      }
-    }
-    // Rounded once from the principal phase, so equal turn counts give equal bits however
-    // the trace was split into calls.
-    phase[i] = static_cast<float>(principal + turns * kTwoPi);
-  }
+  UnwrapPhase(data, phase, begin, end, [](TsComplex v) { return v.Phase(); });
   return S_OK;
 }
 

@@ -1,14 +1,17 @@
 #include "interpolation/circular_core.h"
 
 #include <algorithm>
+#include <cfloat>
 #include <cmath>
 #include <functional>
 #include <numeric>
 #include <optional>
 
 #include "interpolation/arc_math.h"
+#include "interpolation/block_interpolator.h"
 #include "interpolation/gallop_search.h"
 #include "interpolation/phase_fit.h"
+#include "interpolation/trig_table.h"
 #include "lumen/interpolation/linear_interpolation.h"
 
 namespace LumenUtility {
@@ -17,100 +20,116 @@ namespace {
 // A new point this close to an old one (stimulus units) takes the old value.
 constexpr double kMatchTolerance = 0.1;
 
-// Value of one old interval [X[i-1], X[i]] at new stimulus points, with the circle and the
-// magnitude/phase line of the current interval kept until the interval changes.
-class IntervalInterpolator {
- public:
-  IntervalInterpolator(int n, const double* x, const TsComplex* d, InterpolateType type,
-                       const LeadPoint* lead)
-      : m_n(n), m_x(x), m_d(d), m_type(type), m_lead(lead) {}
+// Whether x[0 .. n - 1] never decreases (so holds no NaN).
+bool NonDecreasing(int n, const double* x) {
+  bool ordered = true;
+  for (int k = 0; k + 1 < n; ++k) ordered &= x[k] <= x[k + 1];
+  return ordered;
+}
 
-  // Precondition: 1 <= i <= n - 1.
-  TsComplex At(int i, double x) {
-    if (i != m_i) Enter(i);
-    if (m_arcUsable) {
-      const double t = (x - m_x[i - 1]) / (m_x[i] - m_x[i - 1]);
-      const double theta = t * m_step;
-      if (std::fabs(theta) > kMinimumArcStep) return RotateOnArc(m_arc, m_start, theta);
-    }
-    if (!m_line) m_line.emplace(m_x[i - 1], m_x[i], m_d[i - 1], m_d[i]);
-    return m_line->At(x);
-  }
-
- private:
-  void Enter(int i) {
-    m_i = i;
-    m_line.reset();
-    m_arcUsable = false;
-    if (m_type == INTERP_MAG_PHASE) return;
-    // Three consecutive old points; the last interval looks back one point further. Two old
-    // points borrow the lead point before them, if there is one.
-    double x0, x1, x2;
-    TsComplex p0, p1, p2;
-    if (m_n >= 3) {
-      const int first = i == m_n - 1 ? i - 2 : i - 1;
-      x0 = m_x[first], x1 = m_x[first + 1], x2 = m_x[first + 2];
-      p0 = m_d[first], p1 = m_d[first + 1], p2 = m_d[first + 2];
-    } else if (m_lead != nullptr) {
-      x0 = m_lead->x, x1 = m_x[0], x2 = m_x[1];
-      p0 = m_lead->value, p1 = m_d[0], p2 = m_d[1];
-    } else {
-      return;
-    }
-    // Only exactly even steps: the arc assumes the data turns by equal angles per equal step.
-    if (x1 - x0 != x2 - x1) return;
-    m_arc = ArcThrough(p0, p1, p2);
-    if (!m_arc.TurnsAboveMinimum()) return;
-    const bool lastInterval = i == m_n - 1;
-    m_step = lastInterval ? m_arc.Turn12() : m_arc.Turn01();
-    m_start = lastInterval ? m_arc.w1 : m_arc.w0;
-    m_arcUsable = true;
-  }
-
-  const int m_n;
-  const double* const m_x;
-  const TsComplex* const m_d;
-  const InterpolateType m_type;
-  const LeadPoint* const m_lead;
-
-  int m_i = -1;
-  bool m_arcUsable = false;
-  Arc m_arc;
-  double m_step = 0.0;  // turn across the interval, radians
-  TsComplex m_start;    // interval start relative to the centre
-  std::optional<MagPhaseLine> m_line;
+// The points of one block of the pass.
+struct Block {
+  static constexpr int kSize = BlockInterpolator::kMaxPoints;
+  int interval[kSize];  // old interval (upper index), or the old point a copy takes
+  bool copied[kSize];
+  bool computed[kSize];
+  // Upper index of the old interval that strictly holds the point (or 1 below the old range,
+  // n - 1 above it), as the phase fit's search would find it; 0 where that is not known.
+  int fitInterval[kSize];
+  // Share of the interval at the point: (value - x[i - 1]) / (x[i] - x[i - 1]), for computed
+  // points; the circle's rotation and the phase fit's blend both use it.
+  double t[kSize];
+  bool fitted[kSize];
+  double psi[kSize];
+  double magnitude[kSize];
 };
 
-// Writes every new point; returns how many took an old value.
-int FirstPass(int n, const double* x, const TsComplex* d, const CoreRequest& request) {
+// Writes every new point; returns how many took an old value. With `fit`, each point the
+// phase fit covers gets the fitted phase at its first-pass magnitude. `ordered`: x never
+// decreases, which lets a sweep find its intervals by looking next to the previous one.
+// The points go through in blocks, each stage over the whole block before the next, so that
+// the processor overlaps the work of neighbouring points (see BlockInterpolator).
+int ResamplePass(int n, const double* x, const TsComplex* d, bool ordered,
+                 const CoreRequest& request, PhaseFit* fit) {
   const tagSlope newOrder = Direction(request.newCount, request.newStimulus);
-  IntervalInterpolator interval(n, x, d, request.type, request.lead);
+  if (n == 1) {
+    // Nothing to interpolate between: every point takes the one value.
+    int copied = 0;
+    for (int k = 0; k < request.newCount; ++k) {
+      request.newData[k] = d[0];
+      if (std::fabs(request.newStimulus[k] - x[0]) < kMatchTolerance) ++copied;
+    }
+    return copied;
+  }
+  BlockInterpolator interpolator(n, x, d, request.type, request.lead);
+  const TrigTable& trig = TrigTable::Get();
   int copied = 0;
   int previous = 1;
-  for (int k = 0; k < request.newCount; ++k) {
-    const double value = request.newStimulus[k];
-    if (n == 1) {
-      // Nothing to interpolate between: every point takes the one value.
-      request.newData[k] = d[0];
-      if (std::fabs(value - x[0]) < kMatchTolerance) ++copied;
-      continue;
+  Block block;
+  for (int k0 = 0; k0 < request.newCount; k0 += Block::kSize) {
+    const int count = std::min(Block::kSize, request.newCount - k0);
+    const double* value = request.newStimulus + k0;
+    TsComplex* out = request.newData + k0;
+    int lowest = n, highest = 0;
+    for (int j = 0; j < count; ++j) {
+      const double v = value[j];
+      int i;
+      bool found = false;
+      bool inside = false;
+      if (ordered && previous >= 1 && x[previous - 1] < v && v < x[previous]) {
+        i = previous;
+        inside = true;
+      } else if (ordered && previous + 1 < n && x[previous] < v && v < x[previous + 1]) {
+        i = previous + 1;
+        inside = true;
+      } else {
+        const int lo = newOrder == SLOPE_ASCENDING ? std::max(previous - 1, 0) : 0;
+        i = LocateInterval(x, n, v, lo, found);
+        inside = ordered && !found && (v < x[0] || v > x[n - 1] || (x[i - 1] < v && v < x[i]));
+      }
+      if (std::fabs(v - x[i]) < kMatchTolerance) found = true;
+      // The lower neighbour wins, also over an exact match above it.
+      if (i > 0 && std::fabs(v - x[i - 1]) < kMatchTolerance) {
+        --i;
+        found = true;
+      }
+      previous = i;
+      block.interval[j] = i;
+      block.copied[j] = found;
+      block.computed[j] = !found;
+      block.fitInterval[j] = found || !inside ? 0 : i;
+      if (!found) block.t[j] = (v - x[i - 1]) / (x[i] - x[i - 1]);
+      lowest = std::min(lowest, i);
+      highest = std::max(highest, i);
+      copied += found;
     }
-    const int lo = newOrder == SLOPE_ASCENDING ? std::max(previous - 1, 0) : 0;
-    bool found = false;
-    int i = LocateInterval(x, n, value, lo, found);
-    if (std::fabs(value - x[i]) < kMatchTolerance) found = true;
-    // The lower neighbour wins, also over an exact match above it.
-    if (i > 0 && std::fabs(value - x[i - 1]) < kMatchTolerance) {
-      --i;
-      found = true;
-    }
-    if (found) {
-      request.newData[k] = d[i];
-      ++copied;
+    if (fit != nullptr) {
+      fit->Prepare(lowest - 1, highest + 1);
+      for (int j = 0; j < count; ++j) {
+        const int upper = block.fitInterval[j];
+        block.fitted[j] = upper > 0 ? fit->PhaseBetween(upper, value[j], block.t[j], block.psi[j])
+                                    : fit->PhaseAt(value[j], block.psi[j]);
+      }
     } else {
-      request.newData[k] = interval.At(i, value);
+      std::fill(block.fitted, block.fitted + count, false);
     }
-    previous = i;
+    interpolator.Evaluate(count, block.interval, value, block.t, block.computed, block.fitted, out,
+                          block.magnitude);
+    for (int j = 0; j < count; ++j) {
+      if (!block.copied[j]) continue;
+      const TsComplex old = d[block.interval[j]];
+      if (block.fitted[j]) {
+        block.magnitude[j] = Magnitude(old);
+      } else {
+        out[j] = old;
+      }
+    }
+    for (int j = 0; j < count; ++j) {
+      if (!block.fitted[j]) continue;
+      double s, c;
+      trig.SinCos(block.psi[j], s, c);
+      out[j] = TsComplex(block.magnitude[j] * c, block.magnitude[j] * s);
+    }
   }
   return copied;
 }
@@ -205,12 +224,17 @@ tagInterpStatus CircularCore(const CoreRequest& request, bool* interpolated) {
 
   CoreRequest checked = request;
   checked.newCount = newCount;
-  const int copied = FirstPass(n, x, old.D(), checked);
+  std::optional<PhaseFit> fit;
+  if (request.type != INTERP_CIRCULAR_NO_PHASE_FIT && n >= 3) fit.emplace(n, x, old.D());
+  const bool ordered = NonDecreasing(n, x);
+  const int copied = ResamplePass(n, x, old.D(), ordered, checked, fit ? &*fit : nullptr);
   const bool computed = copied != newCount;
   if (interpolated) *interpolated = computed;
-  if (!computed) return INTERP_UNCHANGED;
-  if (request.type != INTERP_CIRCULAR_NO_PHASE_FIT) {
-    ApplyPhaseFit(n, x, old.D(), newCount, request.newStimulus, request.newData);
+  if (!computed) {
+    // The phase fit runs only where some point was computed: points that took an old value
+    // without sitting exactly on it get that value back.
+    if (fit) ResamplePass(n, x, old.D(), ordered, checked, nullptr);
+    return INTERP_UNCHANGED;
   }
   return INTERP_DONE;
 }

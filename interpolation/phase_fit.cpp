@@ -1,25 +1,15 @@
 #include "interpolation/phase_fit.h"
 
+#include <algorithm>
 #include <cfloat>
 #include <cmath>
-#include <utility>
-#include <vector>
 
+#include "core/phase_unwrap.h"
 #include "interpolation/gallop_search.h"
-#include "lumen/core/vector_formats.h"
+#include "interpolation/trig_table.h"
 
 namespace LumenUtility {
 namespace {
-
-// Phase(x) = a x^2 + b x + c near one old point; `valid` false where no fit was made.
-struct Quadratic {
-  double a = 0.0;
-  double b = 0.0;
-  double c = 0.0;
-  bool valid = false;
-
-  double At(double x) const { return a * x * x + b * x + c; }
-};
 
 // One row of the augmented system: coefficients of the three unknowns, then the right side.
 struct Row {
@@ -71,52 +61,83 @@ bool Solve3x3(const double m[3][3], const double rhs[3], double v[3]) {
   return true;
 }
 
-void ApplyPhaseFit(int n, const double* x, const TsComplex* data, int newCount,
-                   const double* newStimulus, TsComplex* newData) {
+PhaseFit::PhaseFit(int n, const double* x, const TsComplex* data) : m_n(n), m_x(x) {
+  std::fill(m_tag, m_tag + kRing, -1);
   if (n < 3) return;
-  std::vector<float> phase(n);
-  FormatUnwrappedPhase(data, phase.data(), 0, n);
+  m_phase.resize(n);
+  // As FormatUnwrappedPhase unwraps, with the table arc tangent: a third of this pass's time
+  // is otherwise in the library's atan2.
+  const TrigTable& trig = TrigTable::Get();
+  UnwrapPhase(data, m_phase.data(), 0, n, [&trig](TsComplex v) { return trig.Angle(v); });
+}
 
-  std::vector<Quadratic> fits(n);
-  for (int i = 1; i + 1 < n; ++i) {
-    // Only where the two steps are within a factor of 5: a lopsided triple makes the parabola
-    // swing wildly over the longer step.
-    const double ratio = std::fabs(x[i - 1] - x[i]) / std::fabs(x[i + 1] - x[i]);
-    if (!(ratio > 0.2 && ratio < 5.0)) continue;
-    double m[3][3], rhs[3], v[3];
-    for (int j = 0; j < 3; ++j) {
-      const double xj = x[i - 1 + j];
-      m[j][0] = xj * xj;
-      m[j][1] = xj;
-      m[j][2] = 1.0;
-      rhs[j] = phase[i - 1 + j];
-    }
-    if (Solve3x3(m, rhs, v)) fits[i] = {v[0], v[1], v[2], true};
+PhaseFit::Quadratic PhaseFit::MakeFit(std::ptrdiff_t i) const {
+  if (i < 1 || i + 1 >= m_n) return {};
+  const double* x = m_x;
+  // Only where the two steps are within a factor of 5: a lopsided triple makes the parabola
+  // swing wildly over the longer step.
+  const double before = std::fabs(x[i - 1] - x[i]), after = std::fabs(x[i + 1] - x[i]);
+  // Steps within a factor of 4 (the products by powers of 2 are exact) are within 5 without
+  // the division.
+  const bool near = before > 0.25 * after && before < 4.0 * after;
+  if (!near) {
+    const double ratio = before / after;
+    if (!(ratio > 0.2 && ratio < 5.0)) return {};
   }
+  double m[3][3], rhs[3], v[3];
+  for (int j = 0; j < 3; ++j) {
+    const double xj = x[i - 1 + j];
+    m[j][0] = xj * xj;
+    m[j][1] = xj;
+    m[j][2] = 1.0;
+    rhs[j] = m_phase[i - 1 + j];
+  }
+  if (!Solve3x3(m, rhs, v)) return {};
+  return {v[0], v[1], v[2], true};
+}
 
-  std::ptrdiff_t p = 0;
-  for (int k = 0; k < newCount; ++k) {
-    const double value = newStimulus[k];
-    p = GallopBoundary(n, p, [&](std::ptrdiff_t i) { return x[i] >= value; });
-    if (p < n && x[p] == value) continue;
-    const std::ptrdiff_t hi = p == n ? n - 1 : (p == 0 ? 1 : p);
-    const Quadratic& upper = fits[hi];
-    const Quadratic& lower = fits[hi - 1];
-    double psi;
-    if (upper.valid && lower.valid) {
-      const double w = (value - x[hi - 1]) / (x[hi] - x[hi - 1]);
-      psi = w * upper.At(value) + (1.0 - w) * lower.At(value);
-    } else if (upper.valid) {
-      psi = upper.At(value);
-    } else if (lower.valid) {
-      psi = lower.At(value);
-    } else {
-      continue;
-    }
-    const TsComplex v = newData[k];
-    const double magnitude = std::sqrt(double{v.re} * v.re + double{v.im} * v.im);
-    newData[k] = TsComplex(magnitude * std::cos(psi), magnitude * std::sin(psi));
+const PhaseFit::Quadratic& PhaseFit::FitAt(std::ptrdiff_t i) {
+  const std::ptrdiff_t slot = i % kRing;
+  if (m_tag[slot] != i) {
+    m_tag[slot] = i;
+    m_ring[slot] = MakeFit(i);
   }
+  return m_ring[slot];
+}
+
+void PhaseFit::Prepare(std::ptrdiff_t first, std::ptrdiff_t last) {
+  first = std::max<std::ptrdiff_t>(first, 0);
+  last = std::min<std::ptrdiff_t>(last, m_n - 1);
+  if (m_n < 3 || last - first >= kRing) return;
+  for (std::ptrdiff_t i = first; i <= last; ++i) FitAt(i);
+}
+
+bool PhaseFit::PhaseAt(double value, double& psi) {
+  const std::ptrdiff_t n = m_n;
+  if (n < 3) return false;
+  const double* x = m_x;
+  const std::ptrdiff_t p =
+      GallopBoundary(n, m_hint, [&](std::ptrdiff_t i) { return x[i] >= value; });
+  m_hint = p;
+  if (p < n && x[p] == value) return false;
+  const std::ptrdiff_t upper = p == n ? n - 1 : (p == 0 ? 1 : p);
+  const double share = (value - x[upper - 1]) / (x[upper] - x[upper - 1]);
+  return PhaseBetween(upper, value, share, psi);
+}
+
+bool PhaseFit::PhaseBetween(std::ptrdiff_t upper, double value, double share, double& psi) {
+  const Quadratic& high = FitAt(upper);
+  const Quadratic& low = FitAt(upper - 1);
+  if (high.valid && low.valid) {
+    psi = share * high.At(value) + (1.0 - share) * low.At(value);
+  } else if (high.valid) {
+    psi = high.At(value);
+  } else if (low.valid) {
+    psi = low.At(value);
+  } else {
+    return false;
+  }
+  return true;
 }
 
 }  // namespace LumenUtility
