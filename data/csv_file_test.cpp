@@ -10,6 +10,7 @@
 #include <vector>
 
 #include "platform/temp_dir.h"
+#include "platform/test_files.h"
 
 namespace {
 
@@ -246,10 +247,7 @@ class CsvWriteTest : public CsvReadTest {
   }
   std::string Written() {
     csv->Close();
-    std::ifstream in(dir.NarrowPath("out.csv"), std::ios::binary);
-    std::ostringstream bytes;
-    bytes << in.rdbuf();
-    return bytes.str();
+    return LumenUtility::testutil::ReadFileBytes(dir.NarrowPath("out.csv"));
   }
 };
 

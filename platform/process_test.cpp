@@ -9,18 +9,13 @@
 #include <string>
 
 #include "platform/temp_dir.h"
+#include "platform/test_files.h"
 
 namespace {
 
 using LumenUtility::RunProcess;
+using LumenUtility::testutil::ReadFileBytes;
 using LumenUtility::testutil::TempDir;
-
-std::string ReadAll(const std::string& path) {
-  std::ifstream in(path, std::ios::binary);
-  std::ostringstream text;
-  text << in.rdbuf();
-  return text.str();
-}
 
 TEST(RunProcess, PassesArgumentsVerbatimAndReturnsTheExitStatus) {
   TempDir dir;
@@ -37,7 +32,7 @@ TEST(RunProcess, PassesArgumentsVerbatimAndReturnsTheExitStatus) {
   EXPECT_EQ(*status, 3);
   char real[4096];
   ASSERT_NE(realpath(dir.NarrowPath("").c_str(), real), nullptr);
-  EXPECT_EQ(ReadAll(out), std::string("a b|$HOME|;rm -rf x|*|") + real + "\n");
+  EXPECT_EQ(ReadFileBytes(out), std::string("a b|$HOME|;rm -rf x|*|") + real + "\n");
 }
 
 TEST(RunProcess, StandardErrorGoesWithStandardOutputAndInputIsEmpty) {
@@ -50,7 +45,7 @@ TEST(RunProcess, StandardErrorGoesWithStandardOutputAndInputIsEmpty) {
       fd);
   close(fd);
   EXPECT_EQ(status, 1);  // `read` met the end of its input at once
-  EXPECT_EQ(ReadAll(out), "one\ntwo\n");
+  EXPECT_EQ(ReadFileBytes(out), "one\ntwo\n");
 }
 
 TEST(RunProcess, ProgramsThatDoNotStartOrExitGiveNoStatus) {
