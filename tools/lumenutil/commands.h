@@ -14,4 +14,7 @@ void AddHResultCommand(CLI::App& app);
 // Adds `snp` and its commands on Touchstone files.
 void AddSnpCommand(CLI::App& app);
 
+// Adds `zip OUT [-C DIR] FILES...` and `unzip IN -d DIR`.
+void AddZipCommands(CLI::App& app);
+
 }  // namespace lumenutil

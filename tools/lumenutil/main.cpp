@@ -34,6 +34,7 @@ int main(int argc, char** argv) {
   lumenutil::AddVersionCommand(app);
   lumenutil::AddHResultCommand(app);
   lumenutil::AddSnpCommand(app);
+  lumenutil::AddZipCommands(app);
   try {
     app.parse(argc, argv);
   } catch (const CLI::ParseError& e) {
