@@ -49,7 +49,8 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
   std::vector<std::wstring> extracted;
   const bool ok = LumenUtility::ZlibUtil::DoUnzip(archive.wstring(), dest.wstring(), &extracted);
   if (ok) {
-    for (const std::wstring& name : extracted) Check(fs::exists(dest / fs::path(name)));
+    for (const std::wstring& name : extracted)
+      Check(fs::exists(dest / LumenUtility::WideToUtf8(name)));
   }
   Check(fs::is_empty(scratch / "outside"));
   std::size_t beside = 0;

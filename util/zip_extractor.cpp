@@ -84,7 +84,9 @@ bool ZipExtractor::ExtractEntry(std::vector<std::wstring>* extracted) {
       (method != zip::kMethodStored && method != zip::kMethodDeflated))
     return false;
   bool isDirectory = false;
-  const std::optional<std::string> path = ExtractionPath(name, isDirectory);
+  // Bytes that are not UTF-8 become U+FFFD on disk too, so that the reported names find the
+  // files.
+  const std::optional<std::string> path = ExtractionPath(WideToUtf8(Utf8ToWide(name)), isDirectory);
   if (!path || m_destination.size() + path->size() >= PATH_MAX) return false;
   if (!m_root.IsOpen() && !m_root.Open(m_destination)) return false;
 

@@ -81,6 +81,15 @@ TEST_F(UnzipTest, StoredAndDeflatedEntriesAreExtractedAndNamesAppended) {
                                       "out/sub", "out/sub/inner", "out/sub/inner/win.txt"}));
 }
 
+TEST_F(UnzipTest, NameBytesThatAreNotUtf8AreExtractedAsReplacementCharacters) {
+  TestArchive archive;
+  archive.Add(TestEntry("bad\x9a.txt", "b"));
+  Names names;
+  ASSERT_TRUE(Unzip(archive, &names));
+  EXPECT_EQ(names, Names{L"bad\uFFFD.txt"});
+  EXPECT_EQ(Out("bad\xEF\xBF\xBD.txt"), "b");
+}
+
 TEST_F(UnzipTest, NamesThatLeaveTheDestinationWriteNothing) {
   for (const char* name :
        {"../x", "/abs/x", "a/../../x", "..\\x", "C:\\x", "c:x", "sub/../..", "", "/", "."}) {

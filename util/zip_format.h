@@ -27,6 +27,8 @@ inline constexpr std::uint16_t kMethodDeflated = 8;
 inline constexpr std::uint16_t kFlagEncrypted = 1;
 // CRC-32 and sizes follow the data in a data descriptor; the header holds zeros.
 inline constexpr std::uint16_t kFlagDataDescriptor = 8;
+// The entry name is UTF-8 (else the DOS code page 437, by the application note).
+inline constexpr std::uint16_t kFlagUtf8Name = 0x0800;
 
 // The extra block that carries whether daylight saving time was in effect at the entry's
 // modification time: id, then 4 data bytes holding 1 or 0.

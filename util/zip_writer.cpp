@@ -30,6 +30,15 @@ class InputFile {
   int m_fd;
 };
 
+// Names are UTF-8: readers that see the flag decode them so, where they would otherwise take
+// the bytes for the old DOS code page. Plain ASCII names carry no flag, as ever.
+std::uint16_t NameFlags(const std::string& name) {
+  for (const char c : name) {
+    if (static_cast<unsigned char>(c) >= 0x80) return zip::kFlagUtf8Name;
+  }
+  return 0;
+}
+
 // Bytes read into `buffer`, 0 at the end, -1 on an error.
 ssize_t ReadSome(int fd, unsigned char* buffer, std::size_t count) {
   for (;;) {
@@ -192,7 +201,7 @@ std::string ZipWriter::CentralHeader(const Entry& entry) const {
 }
 
 void ZipWriter::PutDescription(std::string& header, const Entry& entry) {
-  zip::Put16(header, 0);  // flags
+  zip::Put16(header, NameFlags(entry.name));
   zip::Put16(header, zip::kMethodDeflated);
   zip::Put16(header, entry.modified.time);
   zip::Put16(header, entry.modified.date);

@@ -158,6 +158,27 @@ TEST_F(ZipTest, InputsThatCannotBePackedAreLeftOutAndTheRestIsPacked) {
   EXPECT_EQ(extracted, (Names{L"in/good.txt"}));
 }
 
+TEST_F(ZipTest, NamesBeyondAsciiAreFlaggedAsUtf8) {
+  Write("plain.txt", "p");
+  Write("na\u00efve \u00b5F.txt", "n");
+  ASSERT_TRUE(Zip({L"plain.txt", L"na\u00efve \u00b5F.txt"}));
+  const std::vector<LocalEntry> entries = LocalEntries(Archive());
+  ASSERT_EQ(entries.size(), 2u);
+  EXPECT_EQ(entries[0].flags, 0);
+  EXPECT_EQ(entries[1].flags, zip::kFlagUtf8Name);
+  Names extracted;
+  ASSERT_TRUE(DoUnzip(dir.Path("out.zip"), dir.Path("x"), &extracted));
+  EXPECT_EQ(extracted, (Names{L"plain.txt", L"na\u00efve \u00b5F.txt"}));
+  if (HaveProgram("python3")) {
+    EXPECT_TRUE(RunTool(L"/usr/bin/python3",
+                        {L"-c",
+                         L"import sys, zipfile\n"
+                         L"names = zipfile.ZipFile(sys.argv[1]).namelist()\n"
+                         L"assert names == ['plain.txt', 'na\\u00efve \\u00b5F.txt'], names\n",
+                         dir.Path("out.zip")}));
+  }
+}
+
 TEST_F(ZipTest, EmptyFileIsAnEndBlockWithCrcZero) {
   Write("empty", "");
   ASSERT_TRUE(Zip({L"empty"}));

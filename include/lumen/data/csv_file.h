@@ -47,10 +47,19 @@ class LUMEN_API CCSVFile : protected CFile {
   CCSVFile();
   ~CCSVFile() override;
 
+  // Hides the base's Open on purpose: the base is not public, and opening must reset the
+  // reading state.
+#if defined(__clang__)
+#pragma clang diagnostic push
+#pragma clang diagnostic ignored "-Woverloaded-virtual"
+#endif
   // Opens `path` with the file's open flags (CFile::modeRead, modeCreate | modeWrite, ...) and
   // starts reading or writing at its first field. Returns nonzero on success; on failure the
   // last error holds the reason (cut to 255 characters), or is empty when none can be had.
   int Open(const wchar_t* path, unsigned mode);
+#if defined(__clang__)
+#pragma clang diagnostic pop
+#endif
   // Closes the file; a failure to close is discarded (each line end has already handed its
   // line to the system, see WriteEndOfLine). Closing a closed file does nothing.
   void Close() override;
@@ -74,7 +83,9 @@ class LUMEN_API CCSVFile : protected CFile {
   int WriteEndOfLine(unsigned* status);
 
   // Nonzero for the error statuses (above 4).
-  int IsError(unsigned status) const { return status > kEndOfFile; }
+  int IsError(unsigned status) const {
+    return status > kEndOfFile;
+  }
   // Copies the last error into `text` (at most `size` characters with the terminator; a longer
   // message is cut). Nothing is written when `text` is null or `size` is 0.
   void GetLastErrorMessage(wchar_t* text, unsigned size) const;
