@@ -22,14 +22,30 @@ void Check(bool condition) {
   if (!condition) __builtin_trap();
 }
 
+// The scratch tree, memory-backed where there is one: every run creates and removes files.
+// Made on the first run and removed when the process ends.
+class ScratchTree {
+ public:
+  ScratchTree() {
+    const fs::path base =
+        fs::is_directory("/dev/shm") ? fs::path("/dev/shm") : fs::temp_directory_path();
+    m_path = base / ("unzip_fuzz_" + std::to_string(getpid()));
+    fs::remove_all(m_path);
+    fs::create_directories(m_path / "outside");
+  }
+  ~ScratchTree() {
+    std::error_code error;
+    fs::remove_all(m_path, error);
+  }
+  const fs::path& Path() const { return m_path; }
+
+ private:
+  fs::path m_path;
+};
+
 const fs::path& Scratch() {
-  static const fs::path path = [] {
-    const fs::path p = fs::temp_directory_path() / ("unzip_fuzz_" + std::to_string(getpid()));
-    fs::remove_all(p);
-    fs::create_directories(p / "outside");
-    return p;
-  }();
-  return path;
+  static const ScratchTree tree;
+  return tree.Path();
 }
 
 }  // namespace
