@@ -1,7 +1,8 @@
 // Measurement data containers and files: named sample buffers and their matrix, error-term
-// names, Touchstone traces, their reader and writer.
+// names, Touchstone traces, their reader and writer, CSV files.
 #pragma once
 
+#include "lumen/data/csv_file.h"
 #include "lumen/data/data_matrix.h"
 #include "lumen/data/eterm_names.h"
 #include "lumen/data/named_buffer.h"

@@ -16,5 +16,7 @@ void AddSnpCommand(CLI::App& app);
 
 // Adds `capture read NAME`: the floats of a data capture block.
 void AddCaptureCommand(CLI::App& app);
+// Adds `zip OUT [-C DIR] FILES...` and `unzip IN -d DIR`.
+void AddZipCommands(CLI::App& app);
 
 }  // namespace lumenutil

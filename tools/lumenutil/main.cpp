@@ -36,6 +36,7 @@ int main(int argc, char** argv) {
   lumenutil::AddHResultCommand(app);
   lumenutil::AddSnpCommand(app);
   lumenutil::AddCaptureCommand(app);
+  lumenutil::AddZipCommands(app);
   try {
     app.parse(argc, argv);
   } catch (const CLI::ParseError& e) {

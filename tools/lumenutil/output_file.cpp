@@ -141,6 +141,15 @@ void WriteOutputFile(const std::string& path, const std::function<void(std::ostr
   temporary.Commit();
 }
 
+bool WriteOutputFileAt(const std::string& path,
+                       const std::function<bool(const std::string& file)>& write) {
+  if (WrittenInPlace(path)) return write(path);
+  TemporaryFile temporary(path);
+  if (!write(temporary.Path())) return false;
+  temporary.Commit();
+  return true;
+}
+
 void RefuseOutputOverInput(const std::string& output, const std::string& input) {
   struct stat out {};
   struct stat in {};

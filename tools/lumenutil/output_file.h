@@ -20,6 +20,12 @@ namespace lumenutil {
 // through.
 void WriteOutputFile(const std::string& path, const std::function<void(std::ostream&)>& write);
 
+// As WriteOutputFile, for writers that take a path: `write` fills the file named by the path it
+// is given (the temporary file, or `path` itself when written in place) and returns whether it
+// succeeded. When it returns false, nothing replaces `path` and false is returned.
+bool WriteOutputFileAt(const std::string& path,
+                       const std::function<bool(const std::string& file)>& write);
+
 // Throws std::runtime_error("OUTPUT: is the input file; choose another output") when
 // `output` names the same existing file as `input` (also through another spelling or a
 // link). For commands that write another format, which would otherwise destroy their input.
