@@ -7,3 +7,5 @@
 #include "lumen/platform/text_conversion.h"
 #include "lumen/platform/archive.h"
 #include "lumen/platform/file.h"
+#include "lumen/platform/com_variant.h"
+#include "lumen/platform/ole_exception.h"
