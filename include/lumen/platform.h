@@ -1,6 +1,6 @@
 // Platform base: result codes, the library exception, text conversions, files and archives,
 // and the stand-ins for the host's profile, debugger output, sound, event tracing, registry,
-// main window and hardware-interface library.
+// main window and hardware-interface library, and the COM variant.
 #pragma once
 
 #include "lumen/export.h"
@@ -21,3 +21,5 @@
 #include "lumen/platform/main_window.h"
 #include "lumen/platform/registry.h"
 #include "lumen/platform/rigel.h"
+#include "lumen/platform/com_variant.h"
+#include "lumen/platform/ole_exception.h"
