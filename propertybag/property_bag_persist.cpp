@@ -3,6 +3,8 @@
 #include <bit>
 #include <cstdint>
 #include <cstring>
+#include <utility>
+#include <vector>
 
 #include "lumen/platform/archive.h"
 #include "lumen/platform/text_conversion.h"
@@ -26,21 +28,22 @@ constexpr std::size_t kLengthBytes = 4;
 }  // namespace
 
 void PropertyBag::SaveContext(CArchive& ar) {
-  std::vector<std::wstring> keys;
-  keys.reserve(m_items.size());
-  for (const auto& entry : m_items) {
-    keys.push_back(Utf8ToWide(entry.first));
+  // The entries are taken first, so the count written stays true even if an item's Serialize
+  // changes the bag.
+  std::vector<std::pair<std::wstring, boost::shared_ptr<PropertyBagItem>>> entries;
+  entries.reserve(m_items.size());
+  for (const auto& [key, item] : m_items) {
+    entries.emplace_back(Utf8ToWide(key), item);
     // Bytes that are not UTF-8 would come back as U+FFFD, a key the bag does not hold, and
     // make the whole archive unreadable: refuse before anything is written.
-    if (WideToUtf8(keys.back()) != entry.first) {
+    if (WideToUtf8(entries.back().first) != key) {
       throw CArchiveException(CArchiveException::genericException);
     }
   }
-  ar << static_cast<std::uint32_t>(m_items.size());
-  std::size_t index = 0;
-  for (const auto& entry : m_items) {
-    ar << keys[index++];
-    entry.second->Serialize(ar);
+  ar << static_cast<std::uint32_t>(entries.size());
+  for (const auto& [key, item] : entries) {
+    ar << key;
+    item->Serialize(ar);
   }
 }
 

@@ -41,9 +41,6 @@ TEST(PropertyBagSubscriber, AttachesWhileInScopeAndReattachesOnInit) {
     attachment.Init(&first, &target);
   }
   EXPECT_EQ(NoticesOfOneChange(first, log), 0u);  // the destructor detached it
-
-  PropertyBagSubscriber detached;
-  EXPECT_EQ(detached.GetBag(), nullptr);
 }
 
 TEST(PropertyBagSubscriber, LetsGoWhenItsBagIsDestroyedFirst) {
@@ -98,8 +95,7 @@ TEST(GlobalPropertyBagSubscriber, SubscribesItsTargetWhileInScope) {
 
     subscription.Init(&other);
     EXPECT_FALSE(PropertyBag::m_GlobalSubscrbers.Contains(&target));
-    EXPECT_EQ(NoticesOfOneChange(bag, log), 1u);
-    EXPECT_EQ(log[0].subscriber, &other);
+    EXPECT_TRUE(PropertyBag::m_GlobalSubscrbers.Contains(&other));
 
     subscription.Init(nullptr);
     EXPECT_EQ(subscription.GetTarget(), nullptr);
