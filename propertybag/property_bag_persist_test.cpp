@@ -284,8 +284,8 @@ class CorruptedLegacyBlock : public ::testing::Test {
     const auto power = Item();
     bag.AddItem("Power", power);
     bag.AddItem("Span", Item());
-    const auto exact = std::make_unique<unsigned char[]>(block.size() + 1);
-    std::memcpy(exact.get(), block.data(), block.size());
+    const auto exact = std::make_unique<unsigned char[]>(block.size());
+    if (!block.empty()) std::memcpy(exact.get(), block.data(), block.size());
     bag.LegacyRecallContext(exact.get(), static_cast<int>(block.size()));
     return power->legacy;
   }

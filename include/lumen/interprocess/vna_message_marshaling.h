@@ -27,7 +27,8 @@ namespace vna_interprocess {
 
 class LUMEN_API VNAMessageMarshaling {
  public:
-  enum OPERATION { STORE = 0, LOAD = 1 };
+  // Fixed to int so that every value a caller passes is a valid one (all but 0 read).
+  enum OPERATION : int { STORE = 0, LOAD = 1 };
 
   // One registered message class.
   struct FACTORY_ENTRY {
