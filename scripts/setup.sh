@@ -2,7 +2,8 @@
 # Installs the Debian packages the build, tests and tools need, when missing.
 set -euo pipefail
 packages=(cmake ninja-build g++ clang libclang-rt-14-dev pkg-config libboost-dev zlib1g-dev
-          libgtest-dev libgmock-dev libbenchmark-dev libcli11-dev librsvg2-bin python3)
+          libgtest-dev libgmock-dev libbenchmark-dev libcli11-dev librsvg2-bin python3
+          zip unzip p7zip-full)
 missing=()
 for p in "${packages[@]}"; do
   dpkg-query -W -f='${Status}' "$p" 2>/dev/null | grep -q "install ok installed" || missing+=("$p")

@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
 # Builds and runs the whole test suite twice: with g++, then with clang under
-# AddressSanitizer and UndefinedBehaviorSanitizer; then the phase tests, where two threads
-# meet, once more under ThreadSanitizer.
+# AddressSanitizer and UndefinedBehaviorSanitizer; then the tests of the code two threads
+# meet (acquisition component, property bags, shared-memory names) under ThreadSanitizer.
 set -euo pipefail
 root=$(cd "$(dirname "$0")/.." && pwd)
 cd "$root"
@@ -20,10 +20,14 @@ cmake --build build-asan -j"$jobs"
 ASAN_OPTIONS=detect_leaks=1:abort_on_error=1 UBSAN_OPTIONS=print_stacktrace=1 \
   ctest --test-dir build-asan --output-on-failure -j"$jobs"
 
-# The acquisition component is the one place where two threads meet: its tests run again
-# under ThreadSanitizer, which a report fails.
-echo "== Thread-sanitized phase tests (clang, TSan)"
+# Where two threads meet, the tests run again under ThreadSanitizer, which a report fails.
+echo "== Thread-sanitized tests (clang, TSan)"
 CC=clang CXX=clang++ cmake -S . -B build-tsan -G Ninja -DCMAKE_BUILD_TYPE=RelWithDebInfo \
   -DCMAKE_CXX_FLAGS=-fsanitize=thread -DLUMEN_BUILD_BENCH=OFF -DLUMEN_BUILD_TOOLS=OFF >/dev/null
-cmake --build build-tsan -j"$jobs" --target phase_tests
-TSAN_OPTIONS=halt_on_error=1 build-tsan/phase/phase_tests
+cmake --build build-tsan -j"$jobs" --target phase_tests propertybag_tests capture_tests
+export TSAN_OPTIONS=halt_on_error=1
+build-tsan/phase/phase_tests
+build-tsan/propertybag/propertybag_tests
+# The capture tests also fork, which ThreadSanitizer does not follow; its thread test runs.
+build-tsan/capture/capture_tests --gtest_filter='SharedMemoryRegistry.*'
+
