@@ -26,7 +26,8 @@ namespace LumenUtility {
 
 class LUMEN_API FileSearch {
  public:
-  enum RecurseSubDirs { Recurse = 0, NoRecurse = 1 };
+  // Any value other than Recurse searches the directory alone, as the original flag does.
+  enum RecurseSubDirs : int { Recurse = 0, NoRecurse = 1 };
 
   // Runs Search(path, recurse).
   FileSearch(const wchar_t* path, RecurseSubDirs recurse);
