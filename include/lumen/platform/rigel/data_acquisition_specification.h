@@ -2,7 +2,7 @@
 // as command parameters: a static collection that holds for the whole acquisition, and the
 // dynamic dimensions whose parameters change from step to step.
 //
-// Thread-safety: confine to one thread. Ownership: the specification owns its static
+// Thread-safety: confine to one thread. Ownership: a DataAcquisitionSpecification owns its static
 // collection and shares its dimensions.
 #pragma once
 
