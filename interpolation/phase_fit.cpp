@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cfloat>
 #include <cmath>
+#include <utility>
 
 #include "core/phase_unwrap.h"
 #include "interpolation/gallop_search.h"
@@ -16,12 +17,11 @@ struct Row {
   double u, v, w, rhs;
 };
 
-// Exchanges the rows when `exchange` holds, as selects rather than a branch or a copy through
-// memory: the pivot choice is data dependent and the rows should stay in registers.
+// Exchanges the rows when `exchange` holds. A branch, not selects: along a sweep the pivot
+// choice is the same fit after fit, so the branch is predicted, where selects would cost
+// three instructions for each of the eight values moved.
 inline void ExchangeIf(bool exchange, Row& p, Row& q) {
-  const Row a = p, b = q;
-  p = {exchange ? b.u : a.u, exchange ? b.v : a.v, exchange ? b.w : a.w, exchange ? b.rhs : a.rhs};
-  q = {exchange ? a.u : b.u, exchange ? a.v : b.v, exchange ? a.w : b.w, exchange ? a.rhs : b.rhs};
+  if (exchange) std::swap(p, q);
 }
 
 // A pivot below this magnitude (or NaN) makes the system singular.
