@@ -5,15 +5,13 @@
 
 #include <cmath>
 
-#include "lumen/core/ts_complex.h"
-
 namespace LumenUtility {
 
-// FormatUnwrappedPhase over the valid range begin <= end, data and phase non-null when the
-// range is not empty, with phaseOf(data[i]) as the principal phase (radians, (-pi, pi]) of
-// point i.
+// FormatUnwrappedPhase over the valid range begin <= end (phase non-null when the range is not
+// empty), with phaseOf(i) as the principal phase (radians, (-pi, pi]) of point i, asked for in
+// ascending order.
 template <typename PhaseOf>
-void UnwrapPhase(const TsComplex* data, float* phase, int begin, int end, PhaseOf phaseOf) {
+void UnwrapPhase(float* phase, int begin, int end, PhaseOf phaseOf) {
   constexpr double kPi = 3.141592653589793;
   constexpr double kTwoPi = 6.283185307179586;
   constexpr double kInvTwoPi = 0.15915494309189535;
@@ -26,7 +24,7 @@ void UnwrapPhase(const TsComplex* data, float* phase, int begin, int end, PhaseO
   }
 
   for (int i = begin; i < end; ++i) {
-    const double principal = phaseOf(data[i]);
+    const double principal = phaseOf(i);
     const double phi = principal + turns * kTwoPi;
     if (i > 0) {
       const double d = phi - phase[i - 1];

@@ -105,7 +105,7 @@ std::int32_t FormatUnwrappedPhase(const TsComplex* data, float* phase, int begin
   if (begin == end) return S_OK;
   if (data == nullptr || phase == nullptr) return E_INVALIDARG;
 
-  UnwrapPhase(data, phase, begin, end, [](TsComplex v) { return v.Phase(); });
+  UnwrapPhase(phase, begin, end, [data](int i) { return data[i].Phase(); });
   return S_OK;
 }
 

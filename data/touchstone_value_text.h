@@ -1,11 +1,13 @@
 // The numbers of a Touchstone file chosen backwards from the values a reader is to hold:
-// for each stored float or double, the file number whose reading (the arithmetic of
-// CSnPFileBase) gives it back bit for bit, and the shortest text of that number.
+// for each stored float or double, the file number of fewest significant digits whose
+// reading (the arithmetic of CSnPFileBase) gives it back bit for bit.
 //
-// A reading multiplies by a unit, takes cosines of degrees or powers of ten, so the exact
-// file number is found by trying the float or double nearest the inverse and its neighbours
-// (two steps either way). Where no neighbour reads back exactly, the nearest one found is
-// taken and the result says so. Thread-safety: pure functions.
+// A reading multiplies by a unit, takes cosines of degrees or powers of ten, so an exact file
+// number is found by trying the float or double nearest the inverse and its neighbours (two
+// steps either way), and then the inverse rounded to 1, 2, ... digits until one of those
+// reads back exactly too (a file that said "-0.00758" dB gets "-0.00758" again rather than
+// the "-0.007579708" of the float parts). Where no neighbour reads back exactly, the nearest
+// one found is taken and the result says so. Thread-safety: pure functions.
 #pragma once
 
 #include <string>

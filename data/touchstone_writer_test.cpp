@@ -4,6 +4,7 @@
 
 #include <bit>
 #include <charconv>
+#include <cstdio>
 #include <cmath>
 #include <cstdint>
 #include <fstream>
@@ -257,6 +258,8 @@ TEST(TouchstoneWriter, AFileWrittenInItsOwnFormAndUnitReadsBackBitForBit) {
               << ", " << unit.token;
           EXPECT_EQ(result.inexactValues, 0u);
           EXPECT_EQ(result.inexactStimulus, 0u);
+          // What reads back exactly is written again as the same text.
+          EXPECT_EQ(Write(again, options), text);
           EXPECT_EQ(again.GetFileInfo().version, version);
           EXPECT_EQ(again.GetFileInfo().form, form);
           EXPECT_EQ(again.GetFileInfo().stimulusUnit, unit.token);
@@ -279,6 +282,59 @@ TEST(TouchstoneWriter, ManyTwoPortValuesReadBackInEveryForm) {
     EXPECT_TRUE(SameSet(Read(text, 2), original)) << LumenUtility::SnPFormToken(form);
     EXPECT_EQ(result.values, 20000u);
     EXPECT_EQ(result.inexactValues, 0u);
+  }
+}
+
+std::vector<std::string> Tokens(const std::string& text) {
+  std::vector<std::string> tokens;
+  std::istringstream lines(text);
+  for (std::string line; std::getline(lines, line);) {
+    if (line.empty() || line[0] == '!' || line[0] == '#') continue;
+    std::istringstream words(line);
+    for (std::string word; words >> word;) tokens.push_back(word);
+  }
+  return tokens;
+}
+
+TEST(TouchstoneWriter, NumbersComeBackNoLongerThanTheFileWroteThem) {
+  // Values of 1 to 6 significant digits, as instruments write them: the writer finds a text
+  // at most as long for each, although the float parts alone would need up to nine digits.
+  Random random(16);
+  char buffer[32];
+  const auto digits = [&](double value) {
+    std::snprintf(buffer, sizeof buffer, "%.*g", random.Integer(1, 6), value);
+    return std::string(buffer);
+  };
+  for (ESNPForm form : kForms) {
+    std::string text = std::string("# GHZ S ") + LumenUtility::SnPFormToken(form) + " R 50\n";
+    double x = 0.5;
+    for (int p = 0; p < 2000; ++p) {
+      x += random.Uniform(0.001, 0.01);
+      text += digits(x);
+      for (int pair = 0; pair < 4; ++pair) {
+        const double a = form == SNP_DB   ? random.Uniform(-90.0, 10.0)
+                         : form == SNP_MA ? random.Uniform(0.0, 1.5)
+                                          : random.Uniform(-1.0, 1.0);
+        const double b = form == SNP_RI ? random.Uniform(-1.0, 1.0) : random.Uniform(-180, 180);
+        text += " " + digits(a) + " " + digits(b);
+      }
+      text += "\n";
+    }
+    const CSnPFileBase file = Read(text, 2);
+    TouchstoneWriteResult result;
+    const std::string written = Write(file, Options(1, form, LumenUtility::SNP_UNIT_GHZ), &result);
+    EXPECT_EQ(result.inexactValues, 0u);
+    const std::vector<std::string> before = Tokens(text);
+    const std::vector<std::string> after = Tokens(written);
+    ASSERT_EQ(before.size(), after.size());
+    int longer = 0;
+    for (std::size_t i = 0; i < before.size(); ++i) {
+      if (after[i].size() > before[i].size() && ++longer <= 3) {
+        ADD_FAILURE() << LumenUtility::SnPFormToken(form) << ": '" << before[i] << "' written as '"
+                      << after[i] << "'";
+      }
+    }
+    EXPECT_EQ(longer, 0);
   }
 }
 

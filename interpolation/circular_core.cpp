@@ -73,16 +73,21 @@ int ResamplePass(int n, const double* x, const TsComplex* d, bool ordered,
     int lowest = n, highest = 0;
     for (int j = 0; j < count; ++j) {
       const double v = value[j];
-      int i;
+      int i = 0;
       bool found = false;
       bool inside = false;
-      if (ordered && previous >= 1 && x[previous - 1] < v && v < x[previous]) {
-        i = previous;
-        inside = true;
-      } else if (ordered && previous + 1 < n && x[previous] < v && v < x[previous + 1]) {
-        i = previous + 1;
-        inside = true;
-      } else {
+      // A sweep finds most points in the interval of the one before or in one of the next
+      // three (new points denser or sparser than the old).
+      if (ordered) {
+        for (int c = std::max(previous, 1), end = std::min(previous + 3, n - 1); c <= end; ++c) {
+          if (x[c - 1] < v && v < x[c]) {
+            i = c;
+            inside = true;
+            break;
+          }
+        }
+      }
+      if (!inside) {
         const int lo = newOrder == SLOPE_ASCENDING ? std::max(previous - 1, 0) : 0;
         i = LocateInterval(x, n, v, lo, found);
         inside = ordered && !found && (v < x[0] || v > x[n - 1] || (x[i - 1] < v && v < x[i]));

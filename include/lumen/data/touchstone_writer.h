@@ -4,8 +4,10 @@
 // Every number is written as the shortest text that reads back to the very float (values)
 // or double (stimulus) that CSnPFileBase then holds: the value pair or stimulus text is
 // chosen so that the reader's own arithmetic (angle in degrees, 10^(dB/20), scaling by the
-// unit) lands on the stored bits. So a set read from a file and written in that file's form
-// and unit reads back bit for bit, and RI in Hz keeps any finite trace exactly. A float that
+// unit) lands on the stored bits, and among such texts one of fewest digits is taken. So a
+// set read from a file and written in that file's form and unit reads back bit for bit, with
+// numbers no longer than the file had ("-0.00758" dB stays "-0.00758"), writing it again
+// gives the same text, and RI in Hz keeps any finite trace exactly. A float that
 // another form cannot express exactly (MA and DB use 24-bit magnitudes and angles, so some
 // real and imaginary pairs lie between their grid points) is written as the nearest pair;
 // Write reports how many values that touched and the largest relative change (about 1e-7).
