@@ -305,25 +305,20 @@ TEST_F(DataCaptureTest, IncrementalDataAppendsAndNeverPassesItsRegion) {
   Service().AddRequest(1, 2, false, 2);  // the neighbour, another measurement
   Service().AddRequest(L"1:1:FDATA:3");  // same measurement: filled piece by piece too
   const std::wstring name = Commit("incremental");
-  const float first[6] = {0, 1, 2, 3, 4, 5};
-  const float second[6] = {6, 7, 8, 9, 10, 11};
-  const float third[6] = {12, 13, 14, 15, 16, 17};
-  DataCapture::ChannelIRDone(1, 1, 3, first);
-  DataCapture::ChannelIRDone(1, 1, 3, second);
-  DataCapture::ChannelIRDone(1, 1, 3, third);  // the complex region is full: dropped there
-  DataCapture::ChannelIRDone(2, 1, 3, third);  // no requests on channel 2
+  const float data[18] = {0, 1, 2, 3, 4, 5, 6, 7, 8, 9, 10, 11, 12, 13, 14, 15, 16, 17};
+  for (int call = 0; call < 3; ++call) DataCapture::ChannelIRDone(1, 1, 3, data + 6 * call);
+  DataCapture::ChannelIRDone(2, 1, 3, data);  // no requests on channel 2
   DataCapture::ChannelIRDone(1, 1, 3, nullptr);
-  const std::vector<float> floats = Floats(name);
-  std::vector<float> expected = {0, 1, 2, 3, 4, 5, 6, 7, 8, 9, 10, 11, kUntouched, kUntouched};
-  // The formatted request took 3 floats of each call until its 3 were full.
-  expected.insert(expected.end(), {0, 1, 2});
-  EXPECT_EQ(floats, expected);
+  // The third call found the complex region full; the formatted request took 3 floats of
+  // each call until its 3 were full.
+  EXPECT_EQ(Floats(name), (std::vector<float>{0, 1, 2, 3, 4, 5, 6, 7, 8, 9, 10, 11, kUntouched,
+                                              kUntouched, 0, 1, 2}));
 
   const float neighbour[4] = {20, 21, 22, 23};
   DataCapture::ChannelIRDone(1, 2, 4, neighbour);  // 4 floats into a region of 2
-  EXPECT_EQ(Floats(name)[12], 20);
-  EXPECT_EQ(Floats(name)[13], 21);
-  EXPECT_EQ(Floats(name)[14], 0);
+  const std::vector<float> after = Floats(name);
+  EXPECT_EQ(std::vector<float>(after.begin() + 12, after.begin() + 15),
+            (std::vector<float>{20, 21, 0}));
 }
 
 }  // namespace

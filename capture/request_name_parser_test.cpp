@@ -13,59 +13,49 @@ namespace {
 using testutil::ThrownCode;
 
 TEST(RequestNameParser, ReadsChannelMeasurementTypeAndCount) {
-  const DataRequest sdata = RequestNameParser::Parse(L"1:2:SDATA:201");
-  EXPECT_EQ(sdata.channel, 1);
-  EXPECT_EQ(sdata.measurement, 2);
-  EXPECT_TRUE(sdata.isComplex);
-  EXPECT_FALSE(sdata.isCal);
-  EXPECT_FALSE(sdata.isIncremental);
-  EXPECT_EQ(sdata.count, 201u);
-  EXPECT_EQ(sdata.Size(), 402u);
-  EXPECT_EQ(sdata.offset, 0u);
-  EXPECT_TRUE(sdata.blockName.empty());
-
-  const DataRequest cal = RequestNameParser::Parse(L"12:7:CAL:64");
-  EXPECT_TRUE(cal.isCal);
-  EXPECT_FALSE(cal.isComplex);
-  EXPECT_EQ(cal.Size(), 64u);
-  const DataRequest fdata = RequestNameParser::Parse(L"2147483647:007:FDATA:4294967295");
-  EXPECT_FALSE(fdata.isCal || fdata.isComplex);
-  EXPECT_EQ(fdata.channel, 2147483647);
-  EXPECT_EQ(fdata.measurement, 7);
-  EXPECT_EQ(fdata.count, 4294967295u);
+  const struct {
+    const wchar_t* name;
+    std::int32_t channel, measurement;
+    bool isComplex, isCal;
+    std::uint32_t count, size;
+  } cases[] = {
+      {L"1:2:SDATA:201", 1, 2, true, false, 201, 402},
+      {L"12:7:CAL:64", 12, 7, false, true, 64, 64},
+      {L"2147483647:007:FDATA:4294967295", 2147483647, 7, false, false, 4294967295u, 4294967295u},
+  };
+  for (const auto& c : cases) {
+    SCOPED_TRACE(testing::PrintToString(std::wstring(c.name)));
+    const DataRequest r = RequestNameParser::Parse(c.name);
+    EXPECT_EQ(r.channel, c.channel);
+    EXPECT_EQ(r.measurement, c.measurement);
+    EXPECT_EQ(r.isComplex, c.isComplex);
+    EXPECT_EQ(r.isCal, c.isCal);
+    EXPECT_FALSE(r.isIncremental);
+    EXPECT_EQ(r.count, c.count);
+    EXPECT_EQ(r.Size(), c.size);
+    EXPECT_EQ(r.offset, 0u);
+    EXPECT_TRUE(r.blockName.empty());
+  }
 }
 
 TEST(RequestNameParser, EveryMalformedNameIsAnInvalidArgument) {
-  for (const wchar_t* name : {
-           L"1:2:SDATA",      // three fields
-           L"1:2:SDATA:5:6",  // five
-           L"1:2:SDATA:5:",   // a trailing separator makes a fifth, empty field
-           L"",
-           L":::",
-           L"1::FDATA:5",
-           L"1:2:XDATA:5",  // unknown type
-           L"1:2:sdata:5",  // types are upper case
-           L"0:1:FDATA:5",  // channel 0
-           L"1:0:FDATA:5",  // measurement 0
-           L"1:1:FDATA:0",  // count 0
-           L"1:1:FDATA:00",
-           L"-1:1:FDATA:5",
-           L"1:1:FDATA:-5",
-           L"1:1:FDATA:+5",  // no signs
-           L" 1:1:FDATA:5",
-           L"1:1:FDATA:5 ",
-           L"1x:1:FDATA:5",
-           L"a:1:FDATA:5",
-           L"2147483648:1:FDATA:1",  // channel beyond an int
-           L"1:2147483648:FDATA:1",
-           L"1:1:FDATA:4294967296",  // count beyond 32 bits
-           L"1:1:FDATA:99999999999999999999999",
-           L"1:1:FDATA:\uff15",  // a digit of another script
-       }) {
-    EXPECT_EQ(ThrownCode([&] { RequestNameParser::Parse(name); }), E_INVALIDARG) << name;
+  const std::wstring malformed[] = {
+      // Three fields, five, a trailing separator making a fifth empty one, none, empty ones.
+      L"1:2:SDATA", L"1:2:SDATA:5:6", L"1:2:SDATA:5:", L"", L":::", L"1::FDATA:5",
+      // An unknown type, a lower-case one.
+      L"1:2:XDATA:5", L"1:2:sdata:5",
+      // Channel, measurement or count 0.
+      L"0:1:FDATA:5", L"1:0:FDATA:5", L"1:1:FDATA:0", L"1:1:FDATA:00",
+      // Signs, spaces, other characters, a digit of another script, a zero character.
+      L"-1:1:FDATA:5", L"1:1:FDATA:-5", L"1:1:FDATA:+5", L" 1:1:FDATA:5", L"1:1:FDATA:5 ",
+      L"1x:1:FDATA:5", L"a:1:FDATA:5", L"1:1:FDATA:\uff15", std::wstring(L"1:1:FDATA:5\0", 12),
+      // Channel or measurement beyond an int, count beyond 32 bits.
+      L"2147483648:1:FDATA:1", L"1:2147483648:FDATA:1", L"1:1:FDATA:4294967296",
+      L"1:1:FDATA:99999999999999999999999"};
+  for (const std::wstring& name : malformed) {
+    EXPECT_EQ(ThrownCode([&] { RequestNameParser::Parse(name); }), E_INVALIDARG)
+        << testing::PrintToString(name);
   }
-  EXPECT_EQ(ThrownCode([] { RequestNameParser::Parse(std::wstring(L"1:1:FDATA:5\0", 12)); }),
-            E_INVALIDARG);
 }
 
 }  // namespace

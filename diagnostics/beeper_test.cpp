@@ -33,15 +33,12 @@ class GatedHook : public LumenUtility::IBeepHook {
     std::unique_lock<std::mutex> lock(m_mutex);
     m_changed.wait(lock, [&] { return m_calls >= calls; });
   }
-  void Release(int calls) {
+  // Lets the beeps up to number `calls` end; with `restart`, counts calls from 0 again.
+  void Release(int calls, bool restart = false) {
     const std::lock_guard<std::mutex> lock(m_mutex);
+    if (restart) m_calls = 0;
     m_released = calls;
     m_changed.notify_all();
-  }
-  void Reset(int released) {
-    const std::lock_guard<std::mutex> lock(m_mutex);
-    m_calls = 0;
-    m_released = released;
   }
   int Calls() {
     const std::lock_guard<std::mutex> lock(m_mutex);
@@ -60,7 +57,7 @@ class GatedHook : public LumenUtility::IBeepHook {
 
 GatedHook& Hook(int released) {
   static GatedHook hook;
-  hook.Reset(released);
+  hook.Release(released, true);
   LumenUtility::SetBeepHook(&hook);
   return hook;
 }

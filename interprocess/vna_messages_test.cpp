@@ -54,17 +54,9 @@ TEST(VNAMessages, GoldenBytesOfEachMessage) {
 }
 
 TEST(VNAMessages, BlocksOfSeveralItemsReadBackInTheWritersOrder) {
-  VNAMessageError error;
-  error.set_Error(0xE8080882);
-  error.set_Hint1(1);
-  error.set_Hint2(2);
-  error.set_ExtraText(std::string("Port 2 overload"));
-  VNAMessageEvent event;
-  event.set_Event(40);
-  event.set_Hint1(41);
-  event.set_Hint2(42);
-  VNAMessageText text;
-  text.set_Text(std::string(300, 't'));
+  const VNAMessageError error(0xE8080882, 1, 2, L"Port 2 overload");
+  const VNAMessageEvent event(40, 41, 42);
+  const VNAMessageText text(std::string(300, 't'));
 
   std::vector<unsigned char> block;
   VNAMessageMarshaling store(VNAMessageMarshaling::STORE, block);
@@ -81,12 +73,12 @@ TEST(VNAMessages, BlocksOfSeveralItemsReadBackInTheWritersOrder) {
   EXPECT_TRUE(SameMessage(*p, error));
   load.ReadFromBuffer(between);
   EXPECT_EQ(between, "between");
-  load.ReadFromBuffer(p);
-  ASSERT_TRUE(p);
-  EXPECT_TRUE(SameMessage(*p, event));
-  load.ReadFromBuffer(p);
-  ASSERT_TRUE(p);
-  EXPECT_TRUE(SameMessage(*p, text));
+  for (const VNAMarshalObject* expected : {static_cast<const VNAMarshalObject*>(&event),
+                                           static_cast<const VNAMarshalObject*>(&text)}) {
+    load.ReadFromBuffer(p);
+    ASSERT_TRUE(p);
+    EXPECT_TRUE(SameMessage(*p, *expected));
+  }
   EXPECT_EQ(load.GetPosition(), block.size());
 }
 

@@ -121,10 +121,7 @@ TEST(PropertyBagPersist, KeysAreWideWithTheNarrowestCountAndMustBeUtf8) {
             (Bytes{0xFF, 0xFE, 0xFF, 0x01, 0xE9, 0}));
 
   // Bytes that are not UTF-8 could not be looked up again: nothing is written.
-  bag.AddItem(
-      "\xB0"
-      "C",
-      Item());
+  bag.AddItem(std::string("\xB0") + "C", Item());
   CMemFile file;
   CArchive ar(&file, CArchive::store);
   EXPECT_EQ(ArchiveCause([&] { bag.SaveContext(ar); }), CArchiveException::genericException);
@@ -241,21 +238,18 @@ Bytes Record(const std::string& key, const Bytes& payload) {
       .bytes;
 }
 
-void LegacyRecall(PropertyBag& bag, const Bytes& block) {
-  bag.LegacyRecallContext(block.data(), static_cast<int>(block.size()));
-}
-
 TEST(PropertyBagLegacy, KnownKeysGetTheirPayloadAndUnknownOnesAreSkipped) {
   PropertyBag bag;
   const auto power = Item(), empty = Item();
   bag.AddItem("Power", power);
   bag.AddItem("", empty);
-  LegacyRecall(bag, Golden()
-                        .Append(Record("Power", {1, 2, 3, 4}))
-                        .Append(Record("Span", {5, 6}))
-                        .Append(Record("", {}))
-                        .Append(Record("Power", {7}))
-                        .bytes);
+  const Bytes records = Golden()
+                            .Append(Record("Power", {1, 2, 3, 4}))
+                            .Append(Record("Span", {5, 6}))
+                            .Append(Record("", {}))
+                            .Append(Record("Power", {7}))
+                            .bytes;
+  bag.LegacyRecallContext(records.data(), static_cast<int>(records.size()));
   EXPECT_EQ(power->legacy, (std::vector<Bytes>{{1, 2, 3, 4}, {7}}));
   EXPECT_EQ(empty->legacy, std::vector<Bytes>{Bytes{}});  // a zero-length payload is handed over
 

@@ -89,7 +89,6 @@ TEST(GlobalPropertyBagSubscriber, SubscribesItsTargetWhileInScope) {
   PropertyBag bag;
   {
     GlobalPropertyBagSubscriber subscription(&target);
-    EXPECT_EQ(subscription.GetTarget(), &target);
     EXPECT_TRUE(PropertyBag::m_GlobalSubscrbers.Contains(&target));
     EXPECT_EQ(NoticesOfOneChange(bag, log), 1u);
 

@@ -19,11 +19,20 @@ boost::shared_ptr<RecordingItem> Item(std::int32_t value = 0) {
   return boost::make_shared<RecordingItem>(value);
 }
 
-std::vector<const void*> Subscribers(const std::vector<Notice>& log) {
-  std::vector<const void*> order;
-  for (const Notice& n : log) order.push_back(n.subscriber);
-  return order;
-}
+// A log of the changes subscribers heard, and four subscribers that write to it.
+class PropertyBagTest : public ::testing::Test {
+ protected:
+  // The subscribers in the order they heard.
+  std::vector<const void*> Heard() const {
+    std::vector<const void*> order;
+    for (const Notice& n : log) order.push_back(n.subscriber);
+    return order;
+  }
+
+  std::vector<Notice> log;
+  RecordingSubscriber subs[4] = {RecordingSubscriber(&log), RecordingSubscriber(&log),
+                                 RecordingSubscriber(&log), RecordingSubscriber(&log)};
+};
 
 TEST(PropertyBag, AKeyKeepsItsFirstItemAndEmptyItemsAreIgnored) {
   PropertyBag bag;
@@ -49,13 +58,11 @@ TEST(PropertyBag, KeysComeInByteOrder) {
   EXPECT_EQ(bag.GetKeys(), (std::vector<std::string>{"", "B", "a", "b", "z", "\xC3\xA9t\xC3\xA9"}));
 }
 
-TEST(PropertyBag, CopiesShareItemsAndKeepTheirOwnSubscribers) {
-  std::vector<Notice> log;
-  RecordingSubscriber watcher(&log);
+TEST_F(PropertyBagTest, CopiesShareItemsAndKeepTheirOwnSubscribers) {
   PropertyBag source;
   const auto power = Item(1);
   source.AddItem("Power", power);
-  source.SubscribeChanges(&watcher);
+  source.SubscribeChanges(&subs[0]);
 
   PropertyBag copy(source);
   EXPECT_EQ(copy.GetItem("Power"), power.get());
@@ -64,7 +71,7 @@ TEST(PropertyBag, CopiesShareItemsAndKeepTheirOwnSubscribers) {
 
   PropertyBag assigned;
   assigned.AddItem("Span", Item());
-  assigned.SubscribeChanges(&watcher);
+  assigned.SubscribeChanges(&subs[0]);
   assigned = copy;
   EXPECT_EQ(assigned.GetKeys(), std::vector<std::string>{"Power"});
   EXPECT_EQ(assigned.GetItem("Power"), power.get());
@@ -79,16 +86,14 @@ TEST(PropertyBag, CopiesShareItemsAndKeepTheirOwnSubscribers) {
   EXPECT_EQ(log.size(), 2u);  // and so did removing every item
 }
 
-TEST(PropertyBag, CopyMatchesTheSourceKeySet) {
+TEST_F(PropertyBagTest, CopyMatchesTheSourceKeySet) {
   PropertyBag target, source;
   const auto targetA = Item(1), targetC = Item(3), sourceA = Item(10), sourceB = Item(20);
   target.AddItem("a", targetA);
   target.AddItem("c", targetC);
   source.AddItem("a", sourceA);
   source.AddItem("b", sourceB);
-  std::vector<Notice> log;
-  RecordingSubscriber watcher(&log);
-  target.SubscribeChanges(&watcher);
+  target.SubscribeChanges(&subs[0]);
 
   target.Copy(source, "Ch1_");
   EXPECT_EQ(target.GetKeys(), (std::vector<std::string>{"a", "b"}));
@@ -139,10 +144,8 @@ TEST(PropertyBag, PresetsRunInKeyOrderAndMayChangeTheBagMeanwhile) {
   EXPECT_EQ(bag.GetKeys(), (std::vector<std::string>{"b", "d"}));
 }
 
-TEST(PropertyBag, ChangesReachBagSubscribersThenGlobalOnesInPointerOrder) {
-  std::vector<Notice> log;
-  RecordingSubscriber subscribers[3] = {RecordingSubscriber(&log), RecordingSubscriber(&log),
-                                        RecordingSubscriber(&log)};
+TEST_F(PropertyBagTest, ChangesReachBagSubscribersThenGlobalOnesInPointerOrder) {
+  RecordingSubscriber* subscribers = subs;
   PropertyBag bag;
   bag.SubscribeChanges(&subscribers[2]);
   bag.SubscribeChanges(&subscribers[0]);
@@ -154,8 +157,8 @@ TEST(PropertyBag, ChangesReachBagSubscribersThenGlobalOnesInPointerOrder) {
   bag.SignalItemChange("Power", CComVariant(-10.0));
   PropertyBag::GlobalUnsubscribeChanges(&subscribers[0]);
   PropertyBag::GlobalUnsubscribeChanges(&subscribers[1]);
-  EXPECT_EQ(Subscribers(log), (std::vector<const void*>{&subscribers[0], &subscribers[2],
-                                                        &subscribers[0], &subscribers[1]}));
+  EXPECT_EQ(Heard(), (std::vector<const void*>{&subscribers[0], &subscribers[2], &subscribers[0],
+                                               &subscribers[1]}));
   for (const Notice& n : log) {
     EXPECT_EQ(n.bag, &bag);
     EXPECT_EQ(n.key, "Power");
@@ -167,12 +170,11 @@ TEST(PropertyBag, ChangesReachBagSubscribersThenGlobalOnesInPointerOrder) {
   bag.UnsubscribeChanges(&subscribers[0]);
   bag.UnsubscribeChanges(&subscribers[1]);  // absent: nothing happens
   bag.SignalItemChange(std::string("Span"), CComVariant(L"wide"));
-  EXPECT_EQ(Subscribers(log), std::vector<const void*>{&subscribers[2]});
+  EXPECT_EQ(Heard(), std::vector<const void*>{&subscribers[2]});
 }
 
-TEST(PropertyBag, SubscribersGetTheReferencedValueAndGlobalSignalsNameTheirBag) {
-  std::vector<Notice> log;
-  RecordingSubscriber local(&log), global(&log);
+TEST_F(PropertyBagTest, SubscribersGetTheReferencedValueAndGlobalSignalsNameTheirBag) {
+  RecordingSubscriber &local = subs[0], &global = subs[1];
   PropertyBag bag, other;
   bag.SubscribeChanges(&local);
   PropertyBag::GlobalSubscribeChanges(&global);
@@ -190,12 +192,10 @@ TEST(PropertyBag, SubscribersGetTheReferencedValueAndGlobalSignalsNameTheirBag) 
   EXPECT_EQ(log[3].key, "");  // a null key is the empty key
 }
 
-TEST(PropertyBag, AFailedCopyStopsTheNotificationWithItsError) {
-  std::vector<Notice> log;
-  RecordingSubscriber local(&log), global(&log);
+TEST_F(PropertyBagTest, AFailedCopyStopsTheNotificationWithItsError) {
   PropertyBag bag;
-  bag.SubscribeChanges(&local);
-  PropertyBag::GlobalSubscribeChanges(&global);
+  bag.SubscribeChanges(&subs[0]);
+  PropertyBag::GlobalSubscribeChanges(&subs[1]);
   try {
     bag.SignalItemChange("Power", CComVariant::Reference(static_cast<double*>(nullptr)));
     ADD_FAILURE() << "no exception";
@@ -205,16 +205,14 @@ TEST(PropertyBag, AFailedCopyStopsTheNotificationWithItsError) {
   EXPECT_THROW(PropertyBag::GlobalSignalItemChange(
                    &bag, "Power", CComVariant::Reference(static_cast<std::wstring*>(nullptr))),
                COleException);
-  PropertyBag::GlobalUnsubscribeChanges(&global);
+  PropertyBag::GlobalUnsubscribeChanges(&subs[1]);
   EXPECT_TRUE(log.empty());
 }
 
-TEST(PropertyBag, SubscribersMayUnsubscribeThemselvesAndOthersDuringANotification) {
-  std::vector<Notice> log;
-  RecordingSubscriber subscribers[4] = {RecordingSubscriber(&log), RecordingSubscriber(&log),
-                                        RecordingSubscriber(&log), RecordingSubscriber(&log)};
+TEST_F(PropertyBagTest, SubscribersMayUnsubscribeThemselvesAndOthersDuringANotification) {
+  RecordingSubscriber* subscribers = subs;
   PropertyBag bag;
-  for (RecordingSubscriber& s : subscribers) bag.SubscribeChanges(&s);
+  for (RecordingSubscriber& s : subs) bag.SubscribeChanges(&s);
   PropertyBag::GlobalSubscribeChanges(&subscribers[0]);
   PropertyBag::GlobalSubscribeChanges(&subscribers[1]);
   subscribers[1].onChange = [&] {
@@ -224,8 +222,7 @@ TEST(PropertyBag, SubscribersMayUnsubscribeThemselvesAndOthersDuringANotificatio
     PropertyBag::GlobalUnsubscribeChanges(&subscribers[1]);
   };
   bag.SignalItemChange("Power", CComVariant(1));
-  EXPECT_EQ(Subscribers(log),
-            (std::vector<const void*>{&subscribers[0], &subscribers[1], &subscribers[3]}));
+  EXPECT_EQ(Heard(), (std::vector<const void*>{&subscribers[0], &subscribers[1], &subscribers[3]}));
   EXPECT_EQ(PropertyBag::m_GlobalSubscrbers.Size(), 0u);
 }
 
