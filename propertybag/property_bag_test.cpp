@@ -145,20 +145,18 @@ TEST(PropertyBag, PresetsRunInKeyOrderAndMayChangeTheBagMeanwhile) {
 }
 
 TEST_F(PropertyBagTest, ChangesReachBagSubscribersThenGlobalOnesInPointerOrder) {
-  RecordingSubscriber* subscribers = subs;
   PropertyBag bag;
-  bag.SubscribeChanges(&subscribers[2]);
-  bag.SubscribeChanges(&subscribers[0]);
-  bag.SubscribeChanges(&subscribers[0]);  // once only
-  bag.SubscribeChanges(nullptr);          // ignored
-  PropertyBag::GlobalSubscribeChanges(&subscribers[1]);
-  PropertyBag::GlobalSubscribeChanges(&subscribers[0]);  // both on the bag and global
+  bag.SubscribeChanges(&subs[2]);
+  bag.SubscribeChanges(&subs[0]);
+  bag.SubscribeChanges(&subs[0]);  // once only
+  bag.SubscribeChanges(nullptr);   // ignored
+  PropertyBag::GlobalSubscribeChanges(&subs[1]);
+  PropertyBag::GlobalSubscribeChanges(&subs[0]);  // both on the bag and global
 
   bag.SignalItemChange("Power", CComVariant(-10.0));
-  PropertyBag::GlobalUnsubscribeChanges(&subscribers[0]);
-  PropertyBag::GlobalUnsubscribeChanges(&subscribers[1]);
-  EXPECT_EQ(Heard(), (std::vector<const void*>{&subscribers[0], &subscribers[2], &subscribers[0],
-                                               &subscribers[1]}));
+  PropertyBag::GlobalUnsubscribeChanges(&subs[0]);
+  PropertyBag::GlobalUnsubscribeChanges(&subs[1]);
+  EXPECT_EQ(Heard(), (std::vector<const void*>{&subs[0], &subs[2], &subs[0], &subs[1]}));
   for (const Notice& n : log) {
     EXPECT_EQ(n.bag, &bag);
     EXPECT_EQ(n.key, "Power");
@@ -167,10 +165,10 @@ TEST_F(PropertyBagTest, ChangesReachBagSubscribersThenGlobalOnesInPointerOrder) 
 
   // Subscribing twice and unsubscribing once leaves it unsubscribed.
   log.clear();
-  bag.UnsubscribeChanges(&subscribers[0]);
-  bag.UnsubscribeChanges(&subscribers[1]);  // absent: nothing happens
+  bag.UnsubscribeChanges(&subs[0]);
+  bag.UnsubscribeChanges(&subs[1]);  // absent: nothing happens
   bag.SignalItemChange(std::string("Span"), CComVariant(L"wide"));
-  EXPECT_EQ(Heard(), std::vector<const void*>{&subscribers[2]});
+  EXPECT_EQ(Heard(), std::vector<const void*>{&subs[2]});
 }
 
 TEST_F(PropertyBagTest, SubscribersGetTheReferencedValueAndGlobalSignalsNameTheirBag) {
@@ -210,19 +208,18 @@ TEST_F(PropertyBagTest, AFailedCopyStopsTheNotificationWithItsError) {
 }
 
 TEST_F(PropertyBagTest, SubscribersMayUnsubscribeThemselvesAndOthersDuringANotification) {
-  RecordingSubscriber* subscribers = subs;
   PropertyBag bag;
   for (RecordingSubscriber& s : subs) bag.SubscribeChanges(&s);
-  PropertyBag::GlobalSubscribeChanges(&subscribers[0]);
-  PropertyBag::GlobalSubscribeChanges(&subscribers[1]);
-  subscribers[1].onChange = [&] {
-    bag.UnsubscribeChanges(&subscribers[1]);
-    bag.UnsubscribeChanges(&subscribers[2]);
-    PropertyBag::GlobalUnsubscribeChanges(&subscribers[0]);
-    PropertyBag::GlobalUnsubscribeChanges(&subscribers[1]);
+  PropertyBag::GlobalSubscribeChanges(&subs[0]);
+  PropertyBag::GlobalSubscribeChanges(&subs[1]);
+  subs[1].onChange = [&] {
+    bag.UnsubscribeChanges(&subs[1]);
+    bag.UnsubscribeChanges(&subs[2]);
+    PropertyBag::GlobalUnsubscribeChanges(&subs[0]);
+    PropertyBag::GlobalUnsubscribeChanges(&subs[1]);
   };
   bag.SignalItemChange("Power", CComVariant(1));
-  EXPECT_EQ(Heard(), (std::vector<const void*>{&subscribers[0], &subscribers[1], &subscribers[3]}));
+  EXPECT_EQ(Heard(), (std::vector<const void*>{&subs[0], &subs[1], &subs[3]}));
   EXPECT_EQ(PropertyBag::m_GlobalSubscrbers.Size(), 0u);
 }
 
