@@ -57,15 +57,6 @@ TEST_F(ReferenceChange, FailingCoreStillEndsTheChangeAndKeepsTheSwitchedReferenc
   EXPECT_TRUE(hardware.external);
 }
 
-TEST_F(ReferenceChange, OtherSettingsNotifyTheCoreOnly) {
-  GlobalState::SetIndexLinePolarity(GlobalState::IndexLineNegative);
-  GlobalState::SetEquationEditorFastProcessingMode(true);
-  GlobalState::SetPowerKnobResolution(1.0);
-  GlobalState::ForcePathElementValue(L"p", L"v");
-  GlobalState::PresetGlobalState();
-  EXPECT_EQ(Events(), (EventLog{L"core", L"core"}));
-}
-
 TEST(ChannelManagerLink, CreatesTheManagerOnceAFactoryCreatorGivesOneThenKeepsIt) {
   const boost::shared_ptr<IFactory> factory = CreateFactory();
   ChannelManagerLink link;

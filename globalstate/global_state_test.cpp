@@ -160,6 +160,7 @@ TEST_F(GlobalStateSettings, ForcedElementsAnswerByLowestHandle) {
   EXPECT_EQ(value, L"C");
   // Handles are never given twice, even after removals.
   EXPECT_EQ(GlobalState::ForcePathElementValue(L"Port1/Switch", L"D"), 3);
+  EXPECT_TRUE(Events().empty());  // forcing notifies no one
 }
 
 TEST_F(GlobalStateSettings, PresetClearsSettingsButKeepsReferenceAndForcedElements) {
@@ -168,7 +169,9 @@ TEST_F(GlobalStateSettings, PresetClearsSettingsButKeepsReferenceAndForcedElemen
   GlobalState::SetEquationEditorFastProcessingMode(true);
   GlobalState::SetPowerKnobResolution(2.0);
   const int handle = GlobalState::ForcePathElementValue(L"Path", L"Value");
+  Events().clear();
   GlobalState::PresetGlobalState();
+  EXPECT_TRUE(Events().empty());  // nor does a preset
   EXPECT_EQ(Stored(L"IndexPolarity"), nullptr);
   EXPECT_EQ(GlobalState::GetIndexLinePolarity(), GlobalState::IndexLinePositive);
   EXPECT_FALSE(GlobalState::GetEquationEditorFastProcessingMode());
