@@ -1,7 +1,8 @@
 #!/usr/bin/env bash
 # Builds and runs the whole test suite twice: with g++, then with clang under
 # AddressSanitizer and UndefinedBehaviorSanitizer; then the tests of the code two threads
-# meet (acquisition component, property bags, shared-memory names) under ThreadSanitizer.
+# meet (acquisition component, property bags, shared-memory names, debug print, beeper and
+# tracing) under ThreadSanitizer.
 set -euo pipefail
 root=$(cd "$(dirname "$0")/.." && pwd)
 cd "$root"
@@ -24,10 +25,14 @@ ASAN_OPTIONS=detect_leaks=1:abort_on_error=1 UBSAN_OPTIONS=print_stacktrace=1 \
 echo "== Thread-sanitized tests (clang, TSan)"
 CC=clang CXX=clang++ cmake -S . -B build-tsan -G Ninja -DCMAKE_BUILD_TYPE=RelWithDebInfo \
   -DCMAKE_CXX_FLAGS=-fsanitize=thread -DLUMEN_BUILD_BENCH=OFF -DLUMEN_BUILD_TOOLS=OFF >/dev/null
-cmake --build build-tsan -j"$jobs" --target phase_tests propertybag_tests capture_tests
+cmake --build build-tsan -j"$jobs" --target phase_tests propertybag_tests capture_tests \
+  diagnostics_tests platform_tests
 export TSAN_OPTIONS=halt_on_error=1
 build-tsan/phase/phase_tests
 build-tsan/propertybag/propertybag_tests
+build-tsan/diagnostics/diagnostics_tests
+build-tsan/platform/platform_tests \
+  --gtest_filter='TraceSession.*:AutoResetEvent.*:WorkerThread.*:JsonTraceFileSink.*'
 # The capture tests also fork, which ThreadSanitizer does not follow; its thread test runs.
 build-tsan/capture/capture_tests --gtest_filter='SharedMemoryRegistry.*'
 
