@@ -1,7 +1,9 @@
-// VNAMarshalObject: anything that VNAMessageMarshaling can write into a message block and
-// rebuild from one; the messages derive from it.
-// Thread-safety: as the derived class; the messages are plain values.
-// Ownership: objects rebuilt from a block are handed out through boost::shared_ptr.
+/** @file */
+/// @class vna_interprocess::VNAMarshalObject
+/// VNAMarshalObject: anything that VNAMessageMarshaling can write into a message block and
+/// rebuild from one; the messages derive from it.
+/// Thread-safety: as the derived class; the messages are plain values.
+/// Ownership: objects rebuilt from a block are handed out through boost::shared_ptr.
 #pragma once
 
 #include "lumen/export.h"
@@ -17,8 +19,8 @@ class LUMEN_API VNAMarshalObject {
   VNAMarshalObject& operator=(const VNAMarshalObject&) = default;
   virtual ~VNAMarshalObject() = default;
 
-  // Writes the object's fields to the storing `m`, in the order in which the class's reading
-  // constructor takes them back.
+  /// Writes the object's fields to the storing `m`, in the order in which the class's reading
+  /// constructor takes them back.
   virtual void marshal(VNAMessageMarshaling& m) const = 0;
 };
 

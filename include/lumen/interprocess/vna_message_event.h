@@ -1,6 +1,8 @@
-// VNAMessageEvent: an event notification between processes (message id 2): the event number
-// and two hints, 32 bits each. Marshaled as id (2 bytes), Event, Hint1, Hint2 (4 bytes each).
-// Thread-safety: a plain value; confine each object to one thread. Ownership: plain value.
+/** @file */
+/// @class vna_interprocess::VNAMessageEvent
+/// VNAMessageEvent: an event notification between processes (message id 2): the event number
+/// and two hints, 32 bits each. Marshaled as id (2 bytes), Event, Hint1, Hint2 (4 bytes each).
+/// Thread-safety: a plain value; confine each object to one thread. Ownership: plain value.
 #pragma once
 
 #include <cstdint>
@@ -14,7 +16,7 @@ class LUMEN_API VNAMessageEvent : public VNAMessageBase {
  public:
   VNAMessageEvent() : VNAMessageEvent(0, 0, 0) {}
   VNAMessageEvent(std::uint32_t event, std::uint32_t hint1, std::uint32_t hint2);
-  // Reads the fields in marshal order from `m`; a value whose 4 bytes are missing is 0.
+  /// Reads the fields in marshal order from `m`; a value whose 4 bytes are missing is 0.
   explicit VNAMessageEvent(VNAMessageMarshaling& m);
   VNAMessageEvent(const VNAMessageEvent&) = default;
   VNAMessageEvent& operator=(const VNAMessageEvent&) = default;

@@ -1,6 +1,8 @@
-// VNAMessageText: a plain text message between processes (message id 4), 8-bit text.
-// Marshaled as id (2 bytes), then the text as a length-prefixed string.
-// Thread-safety: a plain value; confine each object to one thread. Ownership: plain value.
+/** @file */
+/// @class vna_interprocess::VNAMessageText
+/// VNAMessageText: a plain text message between processes (message id 4), 8-bit text.
+/// Marshaled as id (2 bytes), then the text as a length-prefixed string.
+/// Thread-safety: a plain value; confine each object to one thread. Ownership: plain value.
 #pragma once
 
 #include <string>
@@ -14,7 +16,7 @@ class LUMEN_API VNAMessageText : public VNAMessageBase {
  public:
   VNAMessageText() : VNAMessageBase(kId) {}
   explicit VNAMessageText(const std::string& text) : VNAMessageBase(kId), m_text(text) {}
-  // Reads the fields in marshal order from `m`; a missing text is empty.
+  /// Reads the fields in marshal order from `m`; a missing text is empty.
   explicit VNAMessageText(VNAMessageMarshaling& m);
   VNAMessageText(const VNAMessageText&) = default;
   VNAMessageText& operator=(const VNAMessageText&) = default;

@@ -1,10 +1,12 @@
-// CArchiveException: a failed archive operation (wrong direction, end of data, bad content),
-// thrown by value by CArchive and by the code that reads archives.
-//
-// `m_cause` holds the framework's cause numbers; `m_lOsError` is -1 (archive failures do not
-// come from the system; file failures arrive as CFileException); `m_strFileName` names the
-// archive's file when it has one.
-// Thread-safety: a plain value; confine each object to one thread.
+/** @file */
+/// @class CArchiveException
+/// CArchiveException: a failed archive operation (wrong direction, end of data, bad content),
+/// thrown by value by CArchive and by the code that reads archives.
+///
+/// `m_cause` holds the framework's cause numbers; `m_lOsError` is -1 (archive failures do not
+/// come from the system; file failures arrive as CFileException); `m_strFileName` names the
+/// archive's file when it has one.
+/// Thread-safety: a plain value; confine each object to one thread.
 #pragma once
 
 #include <cstdint>
@@ -28,8 +30,8 @@ class LUMEN_API CArchiveException : public std::exception {
 
   explicit CArchiveException(int cause = none, const wchar_t* fileName = nullptr);
 
-  // As CFileException::GetErrorMessage: the message for the cause into `buffer` (at most
-  // `maxChars` characters with the terminator); nonzero when something was written.
+  /// As CFileException::GetErrorMessage: the message for the cause into `buffer` (at most
+  /// `maxChars` characters with the terminator); nonzero when something was written.
   int GetErrorMessage(wchar_t* buffer, unsigned maxChars, unsigned* helpContext = nullptr) const;
   std::wstring GetErrorMessage() const;
   const char* what() const noexcept override;

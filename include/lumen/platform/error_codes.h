@@ -1,8 +1,9 @@
-// Result codes of the analyzer software.
-//
-// Codes are 32-bit HRESULT-style values: bit 31 set means failure. The library's own
-// facility codes (0xE808xxxx) and the platform's general ones are named here; callers that
-// throw a bare code throw an HRESULT by value.
+/// @file
+/// Result codes of the analyzer software.
+///
+/// Codes are 32-bit HRESULT-style values: bit 31 set means failure. The library's own
+/// facility codes (0xE808xxxx) and the platform's general ones are named here; callers that
+/// throw a bare code throw an HRESULT by value.
 #pragma once
 
 #include <cstdint>
@@ -24,11 +25,11 @@ inline constexpr HRESULT E_UNEXPECTED = MakeHResult(0x8000FFFF);
 inline constexpr HRESULT E_OUTOFMEMORY = MakeHResult(0x8007000E);
 inline constexpr HRESULT E_INVALIDARG = MakeHResult(0x80070057);
 
-// Bounds, state, format or version failure; also every phase reference failure.
+/// Bounds, state, format or version failure; also every phase reference failure.
 inline constexpr HRESULT LUMEN_E_BOUNDS = MakeHResult(0xE8080882);
-// Archived data written by an unknown (newer) version.
+/// Archived data written by an unknown (newer) version.
 inline constexpr HRESULT LUMEN_E_UNKNOWN_VERSION = MakeHResult(0xE8080867);
-// A vector kernel could not obtain its temporary buffer.
+/// A vector kernel could not obtain its temporary buffer.
 inline constexpr HRESULT LUMEN_E_KERNEL_BUFFER = MakeHResult(0xE8040453);
 
 constexpr bool Failed(HRESULT hr) {

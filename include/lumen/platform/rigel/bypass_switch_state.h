@@ -1,5 +1,6 @@
-// Vela::BYPASS_SWITCH_STATE: the position of a test port's bypass switch, one of the value
-// types an acquisition parameter can carry. Written as text it shows its number.
+/// @file
+/// Vela::BYPASS_SWITCH_STATE: the position of a test port's bypass switch, one of the value
+/// types an acquisition parameter can carry. Written as text it shows its number.
 #pragma once
 
 namespace Vela {
