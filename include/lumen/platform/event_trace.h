@@ -19,35 +19,52 @@
 
 namespace LumenUtility {
 
+/// A 128-bit identifier of a provider, in the original platform's layout.
 struct GUID {
+  /// First 8 hex digits.
   std::uint32_t Data1;
+  /// Next 4 hex digits.
   std::uint16_t Data2;
+  /// Next 4 hex digits.
   std::uint16_t Data3;
+  /// Last 16 hex digits, two per byte.
   std::uint8_t Data4[8];
 };
 
+/// True when all 16 bytes are equal.
 LUMEN_API bool operator==(const GUID& a, const GUID& b);
 /// The registry form, upper case in braces: "{532E117B-E9BD-4FE9-B3BA-B009375F889B}".
 LUMEN_API std::string GuidToString(const GUID& guid);
 
 /// What an event is: its number within the provider and the fields consumers filter on.
 struct EVENT_DESCRIPTOR {
+  /// Event number within the provider.
   std::uint16_t Id;
+  /// Version of the event's payload layout.
   std::uint8_t Version;
+  /// Channel the event is meant for (0: none).
   std::uint8_t Channel;
+  /// Severity: 1 critical to 5 verbose; sessions take events up to their level.
   std::uint8_t Level;
+  /// Step of an activity (0 info, 1 start, 2 stop).
   std::uint8_t Opcode;
+  /// Task the event belongs to.
   std::uint16_t Task;
+  /// Keyword bits sessions filter on (0: matches every session).
   std::uint64_t Keyword;
 };
 
 /// One item of an event's payload: Size bytes at the address Ptr.
 struct EVENT_DATA_DESCRIPTOR {
+  /// Address of the bytes.
   std::uint64_t Ptr;
+  /// Number of bytes.
   std::uint32_t Size;
+  /// 0.
   std::uint32_t Reserved;
 };
 
+/// Fills `descriptor` for `size` bytes at `data` (not copied until EventWrite).
 inline void EventDataDescCreate(EVENT_DATA_DESCRIPTOR* descriptor, const void* data,
                                 std::uint32_t size) {
   descriptor->Ptr = reinterpret_cast<std::uintptr_t>(data);
@@ -58,11 +75,14 @@ inline void EventDataDescCreate(EVENT_DATA_DESCRIPTOR* descriptor, const void* d
 /// Payload filters of the original platform; sessions here never pass one (always null).
 struct EVENT_FILTER_DESCRIPTOR;
 
+/// A provider registration; 0 is never a valid one.
 using REGHANDLE = std::uint64_t;
 
+///@{
 /// IsEnabled codes passed to an enable callback.
 inline constexpr std::uint32_t EVENT_CONTROL_CODE_DISABLE_PROVIDER = 0;
 inline constexpr std::uint32_t EVENT_CONTROL_CODE_ENABLE_PROVIDER = 1;
+///@}
 
 /// Told when sessions for the provider change: enabled or not, the highest level wanted
 /// (0: every level), the keywords of which an event needs one ("any") and the keywords it
@@ -72,15 +92,19 @@ using PENABLECALLBACK = void (*)(const GUID* sourceId, std::uint32_t isEnabled,
                                  std::uint64_t matchAllKeyword,
                                  EVENT_FILTER_DESCRIPTOR* filterData, void* callbackContext);
 
+///@{
 /// Results, with the original platform's numbers.
 inline constexpr std::uint32_t ERROR_SUCCESS = 0;
 inline constexpr std::uint32_t ERROR_INVALID_HANDLE = 6;
 inline constexpr std::uint32_t ERROR_INVALID_PARAMETER = 87;
 inline constexpr std::uint32_t ERROR_ARITHMETIC_OVERFLOW = 534;
+///@}
 
+///@{
 /// Largest payload of one event in bytes, and most items, as on the original platform.
 inline constexpr std::uint32_t kMaxEventPayloadBytes = 65535;
 inline constexpr std::uint32_t kMaxEventDataDescriptors = 128;
+///@}
 
 /// Registers a provider; `enableCallback` (may be null) is called at once when sessions for
 /// the GUID are running. ERROR_SUCCESS with a nonzero handle in `regHandle`, or

@@ -27,8 +27,13 @@ class Archive;
 
 class LUMEN_API InputArray {
  public:
+  /// Random-access iterator over the points, yielding each by value; valid while the array
+  /// it was taken from lives and keeps its size.
   class const_iterator {
    public:
+    ///@{
+    /// The usual random-access iterator types and operators; comparing iterators of
+    /// different arrays is meaningless, and dereferencing past the end throws as operator[].
     using iterator_category = std::random_access_iterator_tag;
     using value_type = double;
     using difference_type = std::ptrdiff_t;
@@ -77,48 +82,71 @@ class LUMEN_API InputArray {
     friend auto operator<=>(const const_iterator& a, const const_iterator& b) {
       return a.m_index <=> b.m_index;
     }
+    ///@}
 
    private:
     unsigned int m_index = 0;
     const InputArray* m_array = nullptr;
   };
 
+  /// An empty array without segments.
   InputArray();
+  ///@{
+  /// The array of one segment, as SetArray with the same arguments; a negative count `n`
+  /// throws LumenException(E_FAIL, "count").
   explicit InputArray(const Segment& s);
   InputArray(double value, int n);
   InputArray(double start, double stop, int n, SegmentType t);
   explicit InputArray(const std::vector<double>& v);
   InputArray(const double* p, unsigned int n);
+  ///@}
 
+  /// Number of points, over all segments.
   unsigned int size() const { return m_size; }
+  /// True when the array has no points.
   bool empty() const { return m_size == 0; }
   /// Point i; LumenException(E_FAIL, "index") for i >= size().
   double operator[](unsigned int i) const;
+  /// Point i, as operator[].
   double at(unsigned int i) const { return (*this)[i]; }
+  /// First point; throws LumenException(E_FAIL, "index") when empty.
   double front() const { return (*this)[0]; }
+  /// Last point; throws LumenException(E_FAIL, "index") when empty.
   double back() const { return (*this)[m_size - 1]; }
+  /// Iterator at the first point.
   const_iterator begin() const { return const_iterator(0, this); }
+  /// Iterator past the last point.
   const_iterator end() const { return const_iterator(m_size, this); }
 
+  /// Number of segments (0 for a default-constructed array).
   unsigned int NumSegments() const;
+  /// The segments in order; an empty list when there are none.
   const std::vector<Segment>& GetSegments() const;
   /// Throws LumenException(E_FAIL, "segIndex") for k >= NumSegments().
   Segment GetSegment(unsigned int k) const;
   /// Throws LumenException(E_FAIL, "index") past the end.
   const Segment& GetSegmentFromPtIndex(int i) const;
 
+  ///@{
+  /// Every point in order, as one vector of size() values.
   void GetArray(std::vector<double>& out) const;
   std::vector<double> GetArray() const;
+  ///@}
   /// The flattened points, shared; built on first use.
   boost::shared_ptr<const std::vector<double>> GetArrayPtr() const;
   /// Null when empty, else the first flattened point.
   const double* GetRawArray() const;
 
+  ///@{
   /// Smallest / largest point. Throws LumenException(E_FAIL) for an array without segments.
   double min_element() const;
   double max_element() const;
+  ///@}
+  /// True when every point has the same value (also for 0 or 1 points).
   bool IsConstant() const;
+  /// True when the points never turn back (equal neighbours allowed); false when empty.
   bool IsMonotonic() const;
+  /// True when the array is constant or one Linear, Log or Fixed segment.
   bool IsRamp() const;
   /// Range test: min(other) - min(this) <= tolerance and max(this) - max(other) <= tolerance.
   bool IsSubsetOf(const InputArray& other, double tolerance) const;
@@ -127,18 +155,30 @@ class LUMEN_API InputArray {
   /// `indices` becomes, in rising order, every i with low <= point i <= high.
   void SplitInputArrayAtValue(double low, double high, std::vector<int>& indices) const;
 
+  ///@{
+  /// Equality of the point sequences, exact, whatever the segment boundaries.
   bool operator==(const InputArray& other) const;
   bool operator!=(const InputArray& other) const { return !(*this == other); }
+  ///@}
 
+  ///@{
+  /// The array becomes one segment, built as the Segment constructors with the same
+  /// arguments (`value` and `n`: Fixed; `start`, `stop`, `n`, `t`: Linear or Log; a vector or
+  /// `n` doubles at `p`: Arbitrary, copied). A negative `n` throws
+  /// LumenException(E_FAIL, "count") and leaves the array as it was.
   void SetArray(const Segment& s);
   void SetArray(double value, int n);
   void SetArray(double start, double stop, int n, SegmentType t);
   void SetArray(const std::vector<double>& v);
   void SetArray(const double* p, unsigned int n);
+  ///@}
+  /// Appends segment `s`.
   void push_back(const Segment& s);
+  /// Removes the last segment; nothing happens without segments.
   void pop_back();
   /// Inserts before segment k; LumenException(E_FAIL) for k > NumSegments().
   void insert(const Segment& s, unsigned int k);
+  /// Removes segment k; nothing happens for k >= NumSegments().
   void erase(unsigned int k);
   /// Throws LumenException(E_FAIL, "segIndex") for k >= NumSegments().
   void ReplaceSegment(const Segment& s, unsigned int k);
@@ -149,18 +189,26 @@ class LUMEN_API InputArray {
   /// segment or the count already is n. Throws LumenException(E_FAIL) for an Arbitrary
   /// segment asked to grow past its stored points.
   bool Resize(int n);
+  /// Reverses the order of the points (and of the segments).
   void reverse();
+  /// Removes every segment.
   void clear();
+  ///@{
+  /// Adds `x` to, or multiplies by `x`, every point (a Log segment of more than two points
+  /// shifted by `x` becomes Arbitrary).
   InputArray& operator+=(double x);
   InputArray& operator*=(double x);
   InputArray operator+(double x) const;
   InputArray operator*(double x) const;
+  ///@}
   /// Concatenation.
   void operator+=(const InputArray& other);
   /// Replaces arbitrary runs by Linear segments (steps within 0.01 stimulus units).
   void OptimizeRepresentation();
   /// Replaces runs of exactly equal points by Fixed segments.
   void OptimizeRepresentationOnlyFixed();
+  /// The points at `indices`, in that order, with runs recombined as OptimizeRepresentation
+  /// does. Throws LumenException(E_FAIL, "index") for a negative or out-of-range index.
   InputArray ExtractInputArray(const std::vector<int>& indices) const;
 
   /// Persisted forms. Every recall checks the record against the bytes there are, rejects
@@ -205,9 +253,11 @@ class LUMEN_API InputArray {
 /// arrays do not all hold the same number of points.
 LUMEN_API void ConformSegments(std::vector<InputArray>& arrays);
 
+///@{
 /// Both call a.Serialize(ar): the archive's own mode decides the direction.
 LUMEN_API void operator<<(CArchive& ar, InputArray& a);
 LUMEN_API void operator>>(CArchive& ar, InputArray& a);
+///@}
 
 /// Text form: "(" segments separated by line feeds ")", 15 significant digits.
 LUMEN_API std::wostream& operator<<(std::wostream& os, const InputArray& a);

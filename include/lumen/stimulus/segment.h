@@ -20,6 +20,8 @@
 
 namespace LumenUtility {
 
+/// How a segment's points are spaced: Linear and Log between two end values (Log
+/// geometrically, so both ends > 0), Fixed at one value, Arbitrary as an explicit list.
 enum SegmentType : int { Linear = 0, Log = 1, Fixed = 2, Arbitrary = 3 };
 
 class Archive;
@@ -29,6 +31,7 @@ class LUMEN_API Segment {
  public:
   Segment();                              ///< Linear, 0 points
   Segment(double value, unsigned int n);  ///< Fixed
+  /// As SetSegment with the same arguments.
   Segment(double start, double stop, unsigned int n, SegmentType t);
   explicit Segment(const std::vector<double>& v);  ///< Arbitrary, private copy
   Segment(const double* p, unsigned int n);        ///< Arbitrary, private copy
@@ -40,12 +43,18 @@ class LUMEN_API Segment {
   void SetSegment(const std::vector<double>& v);  ///< Arbitrary, private copy
   void clear();                                   ///< the default segment
 
+  /// How the points are spaced.
   SegmentType GetType() const { return m_type; }
+  /// Number of points.
   unsigned int size() const { return m_numPoints; }
+  /// True when the segment has no points.
   bool empty() const { return m_numPoints == 0; }
+  ///@{
+  /// True when the segment is of that type.
   bool IsLinear() const { return m_type == Linear; }
   bool IsLog() const { return m_type == Log; }
   bool IsArbitrary() const { return m_type == Arbitrary; }
+  ///@}
   /// All points equal. Throws LumenException E_FAIL for an unknown type.
   bool IsFixed() const;
 
@@ -53,14 +62,18 @@ class LUMEN_API Segment {
   /// an uncached Linear or Log segment throws LumenException(E_FAIL, "index") for i >= size;
   /// Fixed returns its value for any i. Constant time, no allocation.
   double at(unsigned int i) const;
+  /// Point i, as at().
   double operator[](unsigned int i) const { return at(i); }
+  /// First point, as at(0).
   double front() const { return at(0); }
   /// Throws LumenException(E_FAIL, "Segment::back()") when empty.
   double back() const;
+  ///@{
   /// Smallest / largest point; constant time except for Arbitrary. An empty Arbitrary segment
   /// gives NaN.
   double min_element() const;
   double max_element() const;
+  ///@}
 
   /// Fractional point index (integer part: point; fraction: share of the way to the next)
   /// at which the segment reaches `value`, or -1.0 when it lies outside [front, back].
@@ -70,13 +83,16 @@ class LUMEN_API Segment {
 
   /// `out` becomes the points; an uncached Linear or Log segment keeps them as its cache.
   void GetArray(std::vector<double>& out) const;
+  /// The points as a new vector; an uncached Linear or Log segment keeps them as its cache.
   std::vector<double> GetArray() const;
   /// Writes min(size(), capacity) points; never creates a cache.
   void GetArray(double* out, unsigned int capacity) const;
 
+  ///@{
   /// Equality of the point sequences, exact.
   bool operator==(const Segment& other) const;
   bool operator!=(const Segment& other) const { return !(*this == other); }
+  ///@}
 
   /// Persisted forms. Every recall checks the record against the bytes there are before it
   /// trusts a count, and leaves the segment as it was when it throws.
@@ -99,10 +115,15 @@ class LUMEN_API Segment {
   /// record size does not fit the points, or the type is outside 0 to 3.
   int RecallData(const unsigned char* buffer, int bufferSize);
 
+  ///@{
+  /// Adds `x` to, or multiplies by `x`, every point; Log of more than 2 points shifted by `x`
+  /// becomes Arbitrary.
   Segment& operator+=(double x);  ///< Log of more than 2 points becomes Arbitrary
   Segment& operator*=(double x);
   Segment operator+(double x) const;
   Segment operator*(double x) const;
+  ///@}
+  /// Reverses the order of the points (start and stop swap).
   void reverse();
 
  private:
@@ -133,10 +154,12 @@ class LUMEN_API Segment {
 /// One logarithmically spaced point of a numPts-point sweep from start to stop (> 0).
 /// Throws std::invalid_argument("numPts") for numPts < 1 and ("index") for index >= numPts.
 LUMEN_API double ComputeLogPoint(double start, double stop, int numPts, int index);
+///@{
 /// numPts points into out[0 .. numPts-1]; first and last exactly start and stop. Throws
 /// std::invalid_argument without writing for numPts < 0 or start, stop <= 0.
 LUMEN_API void ComputeLogPoints(double start, double stop, int numPts, double* out);
 LUMEN_API void ComputeLogPoints(double start, double stop, int numPts, std::vector<double>& out);
+///@}
 
 /// Text form: "LIN,n,start,stop", "LOG,n,start,stop", "FIX,n,value" or "ARB,n,p0,...".
 LUMEN_API std::wostream& operator<<(std::wostream& os, const Segment& s);

@@ -1,4 +1,5 @@
-/// @file
+/** @file */
+/// @class Rigel::GenericParameter
 /// Rigel::GenericParameter: the hardware-interface library's abstract value of one named
 /// acquisition parameter.
 ///
@@ -24,20 +25,30 @@ namespace Rigel {
 
 class LUMEN_API GenericParameter {
  public:
+  /// How values are held and handed around.
   using Ptr = boost::shared_ptr<GenericParameter>;
 
+  /// A parameter without a name.
   GenericParameter() = default;
+  /// A parameter named `name`, change flag clear.
   explicit GenericParameter(std::wstring name) : m_name(std::move(name)) {}
+  ///@{
+  /// Copies the name and the change flag.
   GenericParameter(const GenericParameter&) = default;
   GenericParameter& operator=(const GenericParameter&) = default;
+  ///@}
 
   /// The parameter's name, compared exactly (case-sensitive) wherever names are matched.
   const std::wstring& name() const { return m_name; }
 
+  /// True once set_change_flag was called and clear_change_flag not since.
   virtual bool get_change_flag() const;
+  /// Marks the value as changed, to be sent by the hardware layer.
   virtual void set_change_flag();
+  /// Marks the value as sent.
   virtual void clear_change_flag();
 
+  /// Releases the name.
   virtual ~GenericParameter();
 
   /// Element `index` as a new scalar value; the base has no elements: an empty pointer.
@@ -46,6 +57,7 @@ class LUMEN_API GenericParameter {
   virtual Ptr referenced_at(std::uint32_t index);
   /// Stores `value` at `index`; the base ignores it.
   virtual void set_at(std::uint32_t index, const Ptr& value);
+  ///@{
   /// Container operations of the hardware layer; the base is no container: each returns
   /// false, an empty pointer or -1 and changes nothing.
   virtual bool append(const Ptr& value);
@@ -54,6 +66,7 @@ class LUMEN_API GenericParameter {
   virtual std::int32_t pos_find(const std::wstring& name);
   virtual Ptr ptr_quick_search(const std::wstring& name);
   virtual bool remove(std::uint32_t index);
+  ///@}
   /// Number of values held; the base holds one.
   virtual std::uint32_t size() const;
   /// Number of values including those of nested parameters; the base: size().
