@@ -22,6 +22,7 @@
 
 class LUMEN_API CArchive {
  public:
+  /// Direction of an archive: writing (store) or reading (load).
   enum Mode : unsigned { store = 0, load = 1 };
 
   /// `file` must not be null; `mode` is store or load (other bits are ignored).
@@ -31,7 +32,9 @@ class LUMEN_API CArchive {
   /// Flushes a storing archive, discarding file errors (call Close to see them).
   ~CArchive();
 
+  /// True for an archive that writes.
   bool IsStoring() const { return !m_loading; }
+  /// True for an archive that reads.
   bool IsLoading() const { return m_loading; }
   /// The file, or null after Close.
   CFile* GetFile() const { return m_file; }
@@ -46,6 +49,9 @@ class LUMEN_API CArchive {
   /// Writes `count` bytes. Throws CArchiveException readOnly on a loading archive.
   void Write(const void* buffer, unsigned count);
 
+  ///@{
+  /// Writes the value in little-endian byte order (1, 2, 4 or 8 bytes; floats as IEEE-754).
+  /// Throws CArchiveException readOnly on a loading archive.
   CArchive& operator<<(std::uint8_t v);
   CArchive& operator<<(std::int8_t v);
   CArchive& operator<<(std::uint16_t v);
@@ -56,11 +62,13 @@ class LUMEN_API CArchive {
   CArchive& operator<<(std::int64_t v);
   CArchive& operator<<(float v);
   CArchive& operator<<(double v);
+  ///@}
   /// Throws CArchiveException genericException for a string of 2^32 - 1 or more UTF-16
   /// units (the widest count the tagged form has room for).
   CArchive& operator<<(const std::wstring& text);
 
-  /// Each read throws CArchiveException endOfFile (naming the file) when fewer bytes remain
+  ///@{
+  /// Reads a value written by the matching operator<<. Each read throws CArchiveException endOfFile (naming the file) when fewer bytes remain
   /// than the value needs; the value is then unchanged.
   CArchive& operator>>(std::uint8_t& v);
   CArchive& operator>>(std::int8_t& v);
@@ -72,6 +80,7 @@ class LUMEN_API CArchive {
   CArchive& operator>>(std::int64_t& v);
   CArchive& operator>>(float& v);
   CArchive& operator>>(double& v);
+  ///@}
   /// A count larger than the bytes left throws endOfFile once they are used up; the string is
   /// read in pieces, so no allocation exceeds the bytes actually present by more than 64 KiB.
   /// `text` is unchanged on failure.

@@ -22,6 +22,9 @@
 
 class LUMEN_API CFile {
  public:
+  /// Open flags, combinable with |: an access mode (modeRead, modeWrite, modeReadWrite), a
+  /// sharing mode (accepted, not enforced), modeCreate and modeNoTruncate; the type flags are
+  /// accepted and mean nothing (files are bytes).
   enum OpenFlags : unsigned {
     modeRead = 0,
     modeWrite = 1,
@@ -37,6 +40,7 @@ class LUMEN_API CFile {
     typeText = 0x4000,
     typeBinary = 0x8000
   };
+  /// Origin of a Seek.
   enum SeekPosition : unsigned { begin = 0, current = 1, end = 2 };
 
   CFile();
@@ -65,7 +69,9 @@ class LUMEN_API CFile {
   /// bytes from the start. Throws CFileException badSeek for a position before the start or an
   /// unknown origin.
   virtual std::uint64_t Seek(std::int64_t offset, unsigned from);
+  /// Seek(0, begin): returns 0.
   std::uint64_t SeekToBegin() { return Seek(0, begin); }
+  /// Seek(0, end): returns the length in bytes.
   std::uint64_t SeekToEnd() { return Seek(0, end); }
   /// Length of the file in bytes, buffered writes included.
   virtual std::uint64_t GetLength() const;
@@ -80,6 +86,7 @@ class LUMEN_API CFile {
   /// Closes without flushing errors escaping; buffered bytes are still offered to the system.
   virtual void Abort();
 
+  /// True between a successful Open and Close or Abort.
   bool IsOpen() const { return m_fd >= 0; }
   /// The path given to Open or SetFilePath.
   std::wstring GetFilePath() const { return m_strFileName; }
