@@ -12,15 +12,20 @@ namespace vna_interprocess {
 
 class LUMEN_API VNAMessageBase : public VNAMarshalObject {
  public:
+  /// A message of class id `id`.
   explicit VNAMessageBase(short id) : m_id(id) {}
   /// Reads the 2-byte id from `m`. A message keeps its own class id `id` whatever the data
   /// says, except that id 1 takes the id read. With fewer than 2 bytes left nothing is read
   /// and the id is `id`.
   VNAMessageBase(short id, VNAMessageMarshaling& m);
+  ///@{
+  /// Copies the id.
   VNAMessageBase(const VNAMessageBase&) = default;
   VNAMessageBase& operator=(const VNAMessageBase&) = default;
+  ///@}
   ~VNAMessageBase() override = default;
 
+  /// The message's class id.
   short get_id() const { return m_id; }
   /// Writes the id as 2 bytes.
   void marshal(VNAMessageMarshaling& m) const override;

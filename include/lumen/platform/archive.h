@@ -68,8 +68,9 @@ class LUMEN_API CArchive {
   CArchive& operator<<(const std::wstring& text);
 
   ///@{
-  /// Reads a value written by the matching operator<<. Each read throws CArchiveException endOfFile (naming the file) when fewer bytes remain
-  /// than the value needs; the value is then unchanged.
+  /// Reads a value written by the matching operator<<. Each read throws CArchiveException
+  /// endOfFile (naming the file) when fewer bytes remain than the value needs; the value is
+  /// then unchanged.
   CArchive& operator>>(std::uint8_t& v);
   CArchive& operator>>(std::int8_t& v);
   CArchive& operator>>(std::uint16_t& v);
