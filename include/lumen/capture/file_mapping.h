@@ -31,7 +31,11 @@ class LUMEN_API FileMapping {
   /// errno-built code of any other failing call (0x8007001C, ENOSPC, when the memory for a new
   /// object cannot be reserved).
   FileMapping(const std::wstring& name, std::int64_t size);
+  /// A second handle on the same object (a duplicated descriptor); throws the errno-built code
+  /// when the descriptor cannot be duplicated.
   FileMapping(const FileMapping& other);
+  /// Makes this a handle on `other`'s object; on a throw (as the copy constructor) this object
+  /// is unchanged.
   FileMapping& operator=(const FileMapping& other);
   ~FileMapping();
 

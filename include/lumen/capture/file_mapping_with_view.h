@@ -1,4 +1,5 @@
-/// @file
+/** @file */
+/// @class FileMappingWithView
 /// FileMappingWithView<T>: a named shared-memory object with a read/write view of all of it,
 /// seen as an array of T (the library uses float).
 ///

@@ -1,4 +1,5 @@
-/// @file
+/** @file */
+/// @class Interface::ITimeDomainMarkerSetup
 /// Interface::ITimeDomainMarkerSetup: the settings by which time-domain markers show distance.
 ///
 /// Only the enumerations are defined here; they select how Time2Distance and Distance2Time

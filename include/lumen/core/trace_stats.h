@@ -9,6 +9,7 @@
 
 namespace LumenUtility {
 
+///@{
 /// Statistics of [begin, end), accumulated in double precision in one pass: mean, sample
 /// standard deviation (0 for fewer than two values), minimum, maximum and the mean of the
 /// squares. An empty range (begin == end, or either pointer null) writes nothing. NaN values
@@ -17,6 +18,7 @@ namespace LumenUtility {
 LUMEN_API void ComputeStats(const float* begin, const float* end, float& mean, float& stdDev,
                             float& min, float& max, float& meanSquare);
 LUMEN_API void ComputeStats(const double* begin, const double* end, double& mean, double& stdDev,
+///@}
                             double& min, double& max, double& meanSquare);
 
 }  // namespace LumenUtility

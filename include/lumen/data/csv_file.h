@@ -36,6 +36,7 @@ class LUMEN_API CCSVFile : protected CFile {
   /// Capacity of the last-error text in wide characters, terminator included.
   static constexpr unsigned kErrorCapacity = 256;
 
+  /// Outcome of reading one field or line.
   enum Status : unsigned {
     kField = 0,
     kQuotedField = 1,

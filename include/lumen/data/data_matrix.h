@@ -61,6 +61,7 @@ class LUMEN_API DataMatrix {
   bool SetAuxNameByName(const wchar_t* name, std::wstring auxName);
   /// A marker kept for callers; the matrix never interprets it.
   void SetValidIndex(int index) { m_validIndex = index; }
+  /// The marker last set by SetValidIndex.
   int GetValidIndex() const { return m_validIndex; }
 
   /// Number of buffers.
@@ -90,10 +91,12 @@ class LUMEN_API DataMatrix {
   bool SetDataByPhysicalPort(int a, int b, const std::vector<TsComplex>& in, int start = 0,
                              int stop = -1);
 
+  ///@{
   /// The first buffer in name order; false when there is none or the range lies outside
   /// BufferSize().
   bool GetFirstBuffer(std::vector<TsComplex>& out, int start = 0, int stop = -1) const;
   bool GetFirstBuffer(const std::vector<TsComplex>** out) const;
+  ///@}
 
   /// The buffer of that name after following an alias, or else the ratio name
   /// numerator/denominator,suffix: buffer numerator+suffix divided sample by sample by buffer

@@ -26,7 +26,9 @@ class LUMEN_API CSNParameter {
   /// First and last stimulus value (Hz, or the file's own stimulus unit). Throw
   /// LumenException(E_FAIL) when the trace has no stimulus points.
   double GetStartFreq() const { return m_stimulus.front(); }
+  /// Last stimulus point; LumenException(E_FAIL) when the trace has no stimulus points.
   double GetStopFreq() const { return m_stimulus.back(); }
+  /// Number of stimulus points.
   int GetNumPoints() const { return static_cast<int>(m_stimulus.size()); }
 
   /// Sets the stimulus to `stimulus`, then data[i] from the pair (a[i], b[i]) as `form`
@@ -48,19 +50,31 @@ class LUMEN_API CSNParameter {
   /// b degrees. Any other form gives (0, 0).
   static LumenUtility::TsComplex FromPair(float a, float b, ESNPForm form);
 
+  ///@{
+  /// The values, one per stimulus point.
   std::vector<LumenUtility::TsComplex>& GetData() { return m_data; }
   const std::vector<LumenUtility::TsComplex>& GetData() const { return m_data; }
+  ///@}
+  /// The stimulus points (Hz for frequency data).
   const LumenUtility::InputArray& GetStimulus() const { return m_stimulus; }
+  /// Replaces the stimulus points; the values are not resized.
   void SetStimulus(const LumenUtility::InputArray& stimulus) { m_stimulus = stimulus; }
+  /// The trace name, such as "S21".
   const std::wstring& GetName() const { return m_name; }
+  /// Renames the trace.
   void SetName(const std::wstring& name) { m_name = name; }
 
+  ///@{
   /// A second value vector and stimulus carried along for callers that pair the trace with
   /// other data; sized with the trace, never read here.
   std::vector<LumenUtility::TsComplex>& GetSpareData() { return m_spareData; }
   const std::vector<LumenUtility::TsComplex>& GetSpareData() const { return m_spareData; }
+  ///@}
+  ///@{
+  /// A stimulus kept beside the trace for callers; never read here.
   LumenUtility::InputArray& GetSpareStimulus() { return m_spareStimulus; }
   const LumenUtility::InputArray& GetSpareStimulus() const { return m_spareStimulus; }
+  ///@}
 
  private:
   std::vector<LumenUtility::TsComplex> m_data;

@@ -1,5 +1,5 @@
 /** @file */
-/// @class LumenUtility::CSnPFileBase
+/// @class CSnPFileBase
 /// CSnPFileBase: reads a Touchstone file (version 1 or 2.0) into the traces of a
 /// CSNParameterS, and carries them onto other stimulus points (the usual order is
 /// ExtroplateReadSNPFile, then InterpolateReadSNPFile with the same stimulus).
@@ -30,10 +30,12 @@ struct SnPFileInfo {
   std::string stimulusUnit = "GHZ";  ///< the option line's unit token, upper case
   double stimulusMultiplier = 1e9;   ///< stimulus unit of the file, in Hz (1 for SEC, DBM...)
   char parameter = 'S';              ///< S, Y, Z, H or G as the option line names it
+  /// Value form of the option line (RI, MA or DB).
   ESNPForm form = SNP_MA;
   double referenceResistance = 50.0;   ///< ohms, the option line's R
   bool referenceResistanceGiven = false;  ///< the option line gave R a value
   std::vector<double> portReferences;  ///< ohms per port from [Reference]; empty without it
+  /// [Matrix Format] of a version 2 file; full for version 1.
   SnPMatrixFormat matrixFormat = SNP_MATRIX_FULL;
   int declaredFrequencies = 0;  ///< [Number of Frequencies]; 0 when absent
   int noisePoints = 0;          ///< noise records read (two-port files only)
@@ -68,6 +70,7 @@ class LUMEN_API CSnPFileBase : public CSNParameterS {
   /// Why the last read failed, as "line N: ..." (without a line when none is to blame); empty
   /// after a successful read.
   const std::wstring& GetReadError() const { return m_readError; }
+  /// Facts about the last file read successfully.
   const SnPFileInfo& GetFileInfo() const { return m_info; }
 
   /// Interpolate(stimulus, reset) on every matrix trace; the noise traces stay as read. A new
@@ -82,9 +85,13 @@ class LUMEN_API CSnPFileBase : public CSNParameterS {
   /// traces.
   void ExtroplateReadSNPFile(const LumenUtility::InputArray& stimulus);
 
+  /// The sweep type a caller stored; never set by reading.
   SweepTypeEnum GetSweepType() const { return m_sweepType; }
+  /// Stores a sweep type for callers.
   void SetSweepType(SweepTypeEnum type) { m_sweepType = type; }
+  /// What the stimulus is: frequency (Hz) unless the file's unit is seconds, dBm or points.
   ResultType GetResultType() const { return m_resultType; }
+  /// Overrides the result type.
   void SetResultType(ResultType type) { m_resultType = type; }
 
  private:

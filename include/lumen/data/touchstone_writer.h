@@ -37,10 +37,12 @@ enum SnPFrequencyUnit : int {
   SNP_UNIT_GHZ = 3,
 };
 
+///@{
 /// The option-line token of `unit` ("HZ", "KHZ", "MHZ", "GHZ") and its size in Hz (1 to 1e9).
 /// Precondition: `unit` is one of the enumerators.
 LUMEN_API const char* SnPUnitToken(SnPFrequencyUnit unit);
 LUMEN_API double SnPUnitMultiplier(SnPFrequencyUnit unit);
+///@}
 /// The unit a token names, in any case ("ghz", "GHz"); false for anything else.
 LUMEN_API bool SnPUnitFromToken(std::string_view token, SnPFrequencyUnit& unit);
 /// The option-line token of a value form ("RI", "MA", "DB"); precondition: a valid form.
@@ -51,6 +53,7 @@ LUMEN_API bool SnPFormFromToken(std::string_view token, ESNPForm& form);
 /// How a trace set is written.
 struct TouchstoneWriteOptions {
   int version = 1;  ///< 1, or 2 for Touchstone 2.0
+  /// Value form of the data lines: RI, MA (linear magnitude, degrees) or DB (dB, degrees).
   ESNPForm form = SNP_RI;
   /// Unit of a frequency stimulus; a stimulus of seconds, dBm or points (see
   /// CSnPFileBase::GetResultType) is written in its own unit whatever this says.

@@ -48,8 +48,11 @@ enum DebugPrintID : std::int32_t {
 class LUMEN_API ConsoleDPrint {
  public:
   ConsoleDPrint() = default;
+  ///@{
+  /// Copies share nothing and print alike.
   ConsoleDPrint(const ConsoleDPrint&) = default;
   ConsoleDPrint& operator=(const ConsoleDPrint&) = default;
+  ///@}
   virtual ~ConsoleDPrint() = default;
   /// Shows one message (never null), called on the printing thread.
   virtual void Print(const wchar_t* text) = 0;
@@ -59,6 +62,8 @@ LUMEN_API void dprint(std::int32_t slot, const wchar_t* format, ...);
 
 class LUMEN_API CDebugPrint {
  public:
+  /// Where messages go: standard error, the debugger output stand-in, or the file named by
+  /// SetFileName.
   enum OutputDevice : int { Console = 0, Debugger = 1, File = 2 };
 
   /// The start-up state: locked out, every slot off, only the debugger device on, no file
@@ -85,6 +90,7 @@ class LUMEN_API CDebugPrint {
 
   /// While locked out nothing is printed.
   void Lockout(bool locked) { m_locked.store(locked, std::memory_order_relaxed); }
+  /// True while printing is locked out.
   bool IsLocked() const { return m_locked.load(std::memory_order_relaxed); }
 
   /// The file's directory becomes `path` up to and including its last '/' (nothing when it has
@@ -94,6 +100,7 @@ class LUMEN_API CDebugPrint {
   /// Names the file within the directory. When the file device is on, the open file is closed
   /// and the named one opened, created or emptied. Null counts as empty.
   void SetFileName(const wchar_t* name);
+  /// The file name last set; empty when none is.
   std::wstring GetFileName() const;
 
   /// Sets the console device, or clears it with null.
@@ -156,12 +163,16 @@ class LUMEN_API CDebugPrintX {
   /// `sourceFile` is 8-bit (UTF-8), normally __FILE__; it must outlive the tag.
   CDebugPrintX(const char* sourceFile, int sourceLine) : file(sourceFile), line(sourceLine) {}
 
+  ///@{
   /// As dprint, with the tag before the message. Percent signs in the file name print as
   /// they are; those of `format` keep their meaning.
   void operator()(std::int32_t slot, const wchar_t* format, ...) const;
   void operator()(DebugPrintID id, const wchar_t* format, ...) const;
+  ///@}
 
+  /// Source file of the call (`__FILE__`).
   const char* file;
+  /// Source line of the call (`__LINE__`).
   int line;
 
  private:

@@ -36,6 +36,7 @@ LUMEN_API void EnableTPrint(bool enabled);
 /// Whether TPrint is on; false without a tracing object.
 LUMEN_API bool IsTPrintEnabled();
 
+///@{
 /// Writes event `id` (1 to 98; others are ignored) with the payload of its kind: nothing,
 /// the value (4 bytes), the text (UTF-16 with its terminating zero) or the value and then the
 /// text. A missing value is 0, a missing text empty, a null text "NULL"; arguments the
@@ -47,6 +48,7 @@ LUMEN_API void TPrint(short id, const wchar_t* text);
 LUMEN_API void TPrint(short id, const char* text);
 LUMEN_API void TPrint(short id, std::int32_t value, const wchar_t* text);
 LUMEN_API void TPrint(short id, std::int32_t value, const char* text);
+///@}
 
 /// The provider's GUID, {532E117B-E9BD-4FE9-B3BA-B009375F889B}.
 LUMEN_API const GUID& ETWProviderId();

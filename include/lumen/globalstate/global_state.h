@@ -34,6 +34,7 @@ inline constexpr HRESULT LUMEN_E_NO_REFERENCE_STATE = MakeHResult(0xE808089D);
 
 namespace GlobalState {
 
+/// Polarity of the index line: active high or active low.
 enum IndexLinePolarity : int { IndexLinePositive = 0, IndexLineNegative = 1 };
 
 /// The window message sent to the host's main window, wParam and lParam 0, after the

@@ -1,4 +1,5 @@
-/// @file
+/** @file */
+/// @class LumenUtility::GPArray
 /// GPArray<T>: a list of typed values of one acquisition parameter, such as the frequencies of
 /// every point.
 ///
@@ -24,12 +25,16 @@ class LUMEN_API GPArray : public Rigel::GenericParameter {
  public:
   /// An unnamed empty array.
   GPArray() = default;
+  /// An empty array named `name`.
   explicit GPArray(std::wstring name) : GenericParameter(std::move(name)) {}
   /// An array counting all of `values`, none absent. Throws std::length_error for 2^32 or more
   /// values (the count is 32-bit).
   GPArray(std::wstring name, std::vector<T> values);
+  ///@{
+  /// Copies the name, change flag, values and count.
   GPArray(const GPArray&) = default;
   GPArray& operator=(const GPArray&) = default;
+  ///@}
   ~GPArray() override;
 
   /// A new GPScalar<T> with the array's name and a copy of element `index`; an empty pointer

@@ -1,4 +1,5 @@
-/// @file
+/** @file */
+/// @class LumenUtility::GPRef
 /// GPRef<T>: names one element of a GPArray<T>, so that a parameter can follow a value that
 /// the array holds; it shows whatever the element holds when it is asked.
 ///
@@ -20,15 +21,21 @@ class LUMEN_API GPRef : public Rigel::GenericParameter {
  public:
   /// An unnamed reference to no array.
   GPRef() = default;
+  /// A reference named `name` to no array.
   explicit GPRef(std::wstring name) : GenericParameter(std::move(name)) {}
   /// Element `index` of `array` (which may be null).
   GPRef(std::wstring name, GPArray<T>* array, std::uint32_t index)
       : GenericParameter(std::move(name)), m_pArray(array), m_index(index) {}
+  ///@{
+  /// Copies name, change flag, array pointer and index (not the array).
   GPRef(const GPRef&) = default;
   GPRef& operator=(const GPRef&) = default;
+  ///@}
   ~GPRef() override;
 
+  /// The array referred to; may be null.
   GPArray<T>* get_array() const { return m_pArray; }
+  /// The element index within the array.
   std::uint32_t get_index() const { return m_index; }
 
   Ptr create_default() const override;

@@ -1,4 +1,5 @@
-/// @file
+/** @file */
+/// @class LumenUtility::GPScalar
 /// GPScalar<T>: one typed value of an acquisition parameter, such as the double "Freq" of a
 /// source element or the text "RefSel" of the path manager.
 ///
@@ -22,13 +23,19 @@ class LUMEN_API GPScalar : public Rigel::GenericParameter {
  public:
   /// An unnamed value T() (0.0 for double).
   GPScalar() = default;
+  /// A value T() named `name`.
   explicit GPScalar(std::wstring name) : GenericParameter(std::move(name)) {}
+  /// `value` named `name`.
   GPScalar(std::wstring name, T value)
       : GenericParameter(std::move(name)), m_value(std::move(value)) {}
+  ///@{
+  /// Copies name, change flag and value.
   GPScalar(const GPScalar&) = default;
   GPScalar& operator=(const GPScalar&) = default;
+  ///@}
   ~GPScalar() override;
 
+  /// The value.
   const T& get_value() const { return m_value; }
   /// Replaces the value; the change flag is left as it is.
   void set_value(T value) { m_value = std::move(value); }

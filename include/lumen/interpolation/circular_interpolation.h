@@ -30,6 +30,7 @@
 
 namespace LumenUtility {
 
+/// How CircularInterpolation carries complex data between points.
 enum InterpolateType : std::int32_t {
   /// Magnitude/phase interpolation everywhere, then the phase fit.
   INTERP_MAG_PHASE = 0,
@@ -59,6 +60,7 @@ LUMEN_API tagInterpStatus CircularInterpolation(std::int32_t oldCount, const dou
                                                 const double* newStimulus, float* newData,
                                                 bool* interpolated, InterpolateType type);
 
+///@{
 /// As CircularInterpolation with INTERP_CIRCULAR, but new points outside the old range are
 /// extrapolated from the outermost interval instead of failing the call. INTERP_OUT_OF_RANGE
 /// is returned only for an empty old stimulus with new points asked for.
@@ -67,6 +69,7 @@ LUMEN_API tagInterpStatus CircularInterpolationEx(const InputArray& oldStimulus,
                                                   const InputArray& newStimulus, TsComplex* newData,
                                                   bool* interpolated);
 LUMEN_API tagInterpStatus CircularInterpolationEx(std::int32_t oldCount, const double* oldStimulus,
+///@}
                                                   const float* oldData, std::int32_t newCount,
                                                   const double* newStimulus, float* newData,
                                                   bool* interpolated);

@@ -19,18 +19,22 @@
 
 namespace LumenUtility {
 
+///@{
 /// Value of `data` at `index`, computed in double precision: data[i] when the fraction is 0
 /// (data[i + 1] is then not read), else data[i] + f * (data[i + 1] - data[i]). A null array
 /// gives 0. NaN gives NaN without reading. The caller keeps 0 <= index and, when the fraction
 /// is not 0, index + 1 inside the array.
 LUMEN_API double LinearInterpolate(const double* data, double index);
 LUMEN_API float LinearInterpolate(const float* data, double index);
+///@}
 
+///@{
 /// As the pointer forms; an empty vector gives 0. These forms never read outside the vector:
 /// an index below 0 gives the first element, an index past the last element the last one, NaN
 /// gives NaN.
 LUMEN_API double LinearInterpolate(const std::vector<double>& data, double index);
 LUMEN_API float LinearInterpolate(const std::vector<float>& data, double index);
+///@}
 /// Real and imaginary parts interpolated separately in double precision; an empty vector
 /// gives (0, 0). Out-of-range indices as for the real vector forms (NaN gives NaN parts).
 LUMEN_API TsComplex LinearInterpolate(const std::vector<TsComplex>& data, double index);
@@ -58,6 +62,7 @@ LUMEN_API double FindNearestIndex(const InputArray& stimulus, double nearIndex, 
 /// is descending when the last value is below the first. count <= 0 gives SLOPE_MIXED.
 LUMEN_API tagSlope Direction(std::int32_t count, const double* values);
 
+///@{
 /// Carries a trace from `oldStimulus` onto `newStimulus`. Each new point takes the linear
 /// interpolation of `in` at FindNearestIndex(oldStimulus, 0.0, new value): points outside the
 /// old range take the nearer end value; where the old stimulus repeats a value, the first
@@ -81,5 +86,6 @@ LUMEN_API tagInterpStatus LinearInterpolation(const InputArray& oldStimulus,
                                               const InputArray& newStimulus,
                                               const std::vector<TsComplex>& in,
                                               std::vector<TsComplex>& out);
+///@}
 
 }  // namespace LumenUtility

@@ -1,4 +1,5 @@
-/// @file
+/** @file */
+/// @class LumenUtility::PointerSet
 /// PointerSet<T>: the subscriber sets of property bags: an ordered set of non-null T* in
 /// ascending pointer order, each pointer at most once.
 ///

@@ -1,4 +1,5 @@
-/// @file
+/** @file */
+/// @class Rigel::CommandParameter
 /// Rigel::CommandParameter: one entry of an acquisition specification, the value of one
 /// parameter of one hardware element ("Freq" of element "RFSrc0", for example).
 ///

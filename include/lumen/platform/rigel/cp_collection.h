@@ -1,4 +1,5 @@
-/// @file
+/** @file */
+/// @class Rigel::CPCollection
 /// Rigel::CPCollection: an ordered list of command parameters, found by element and
 /// parameter name.
 ///

@@ -1,4 +1,5 @@
-/// @file
+/** @file */
+/// @class Rigel::DataAcquisitionSpecification
 /// Rigel::DataAcquisitionSpecification: what the hardware layer is to do for one acquisition,
 /// as command parameters: a static collection that holds for the whole acquisition, and the
 /// dynamic dimensions whose parameters change from step to step.
