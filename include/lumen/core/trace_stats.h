@@ -18,7 +18,7 @@ namespace LumenUtility {
 LUMEN_API void ComputeStats(const float* begin, const float* end, float& mean, float& stdDev,
                             float& min, float& max, float& meanSquare);
 LUMEN_API void ComputeStats(const double* begin, const double* end, double& mean, double& stdDev,
-///@}
                             double& min, double& max, double& meanSquare);
+///@}
 
 }  // namespace LumenUtility

@@ -33,9 +33,9 @@ class LUMEN_API CSNParameterS {
   /// The trace at matrix index `index`. Throws std::out_of_range for index >= n * n.
   CSNParameter& GetParam(ESNParam index) { return m_params.at(static_cast<int>(index)); }
   const CSNParameter& GetParam(ESNParam index) const {
-  ///@}
     return m_params.at(static_cast<int>(index));
   }
+  ///@}
   ///@{
   /// The trace the k-th pair of a file's data line belongs to. For two ports with the order
   /// flag true, k = 1 and 2 are S21 and S12; a k outside 0..3 gives S11. For other port

@@ -60,6 +60,8 @@ class LUMEN_API ConsoleDPrint {
 
 LUMEN_API void dprint(std::int32_t slot, const wchar_t* format, ...);
 
+/// The debug print facility: lockout, slot switches, output devices and the print file.
+/// The process has one instance, gDebugPrint; see the file description for the rules.
 class LUMEN_API CDebugPrint {
  public:
   /// Where messages go: standard error, the debugger output stand-in, or the file named by

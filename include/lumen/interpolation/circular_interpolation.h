@@ -69,10 +69,10 @@ LUMEN_API tagInterpStatus CircularInterpolationEx(const InputArray& oldStimulus,
                                                   const InputArray& newStimulus, TsComplex* newData,
                                                   bool* interpolated);
 LUMEN_API tagInterpStatus CircularInterpolationEx(std::int32_t oldCount, const double* oldStimulus,
-///@}
                                                   const float* oldData, std::int32_t newCount,
                                                   const double* newStimulus, float* newData,
                                                   bool* interpolated);
+///@}
 
 /// As CircularInterpolationEx, but no interpolation crosses a band edge. The band of a value is
 /// the number of `bandBreaks` strictly below it (a value equal to a break belongs to the band

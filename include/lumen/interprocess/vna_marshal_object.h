@@ -14,9 +14,14 @@ class VNAMessageMarshaling;
 
 class LUMEN_API VNAMarshalObject {
  public:
+  /// An object without fields.
   VNAMarshalObject() = default;
+  ///@{
+  /// Nothing to copy; for derived classes.
   VNAMarshalObject(const VNAMarshalObject&) = default;
   VNAMarshalObject& operator=(const VNAMarshalObject&) = default;
+  ///@}
+  /// For deletion through the base.
   virtual ~VNAMarshalObject() = default;
 
   /// Writes the object's fields to the storing `m`, in the order in which the class's reading

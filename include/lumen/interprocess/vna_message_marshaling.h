@@ -49,6 +49,7 @@ class LUMEN_API VNAMessageMarshaling {
   VNAMessageMarshaling& operator=(const VNAMessageMarshaling&) = delete;
   virtual ~VNAMessageMarshaling() = default;
 
+  /// True for a cursor that writes, false for one that reads.
   bool IsStoring() const { return m_storing; }
   /// The byte offset of the next read or write.
   std::uint32_t GetPosition() const { return m_position; }

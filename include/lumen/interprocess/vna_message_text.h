@@ -15,15 +15,22 @@ namespace vna_interprocess {
 class LUMEN_API VNAMessageText : public VNAMessageBase {
  public:
   VNAMessageText() : VNAMessageBase(kId) {}
+  /// A text message carrying `text` (UTF-8).
   explicit VNAMessageText(const std::string& text) : VNAMessageBase(kId), m_text(text) {}
   /// Reads the fields in marshal order from `m`; a missing text is empty.
   explicit VNAMessageText(VNAMessageMarshaling& m);
+  ///@{
+  /// Copies the text.
   VNAMessageText(const VNAMessageText&) = default;
   VNAMessageText& operator=(const VNAMessageText&) = default;
+  ///@}
   ~VNAMessageText() override = default;
 
+  ///@{
+  /// The text, UTF-8.
   std::string get_Text() const { return m_text; }
   void set_Text(std::string text) { m_text = std::move(text); }
+  ///@}
 
   void marshal(VNAMessageMarshaling& m) const override;
 

@@ -42,8 +42,12 @@ class LUMEN_API PAComponent {
   /// buffer and, on the first construction in the process, sets up the receiver substitution
   /// from the test set (none when no test set is registered).
   PAComponent();
+  ///@{
+  /// Copies the parameter set, records and stitching state; not for a component that is being
+  /// filled on another thread.
   PAComponent(const PAComponent&) = default;
   PAComponent& operator=(const PAComponent&) = default;
+  ///@}
   ~PAComponent() = default;
 
   /// Registers `p` with an empty record unless an equal parameter (by the map's ordering) is
@@ -77,6 +81,7 @@ class LUMEN_API PAComponent {
   /// The record's values; an empty array when `p` is not registered. The reference stays
   /// valid until the parameter set changes.
   const std::vector<LumenUtility::TsComplex>& GetDataByRef(const PAParameter& p) const;
+  /// True when `p` is registered.
   bool IsParameterAvailable(const PAParameter& p) const;
 
   /// Every parameter's numerator and, when ratioed, denominator, in key order; duplicates kept.
@@ -92,6 +97,7 @@ class LUMEN_API PAComponent {
   /// PAReceiver::ToSlot does, leaving the stitch state as it was.
   void SetPhaseStitch(PAParameter& p, const std::vector<int>& breaks, int pointsPerBreak,
                       int leadingPoints, bool hasReferencePoints);
+  /// The phase stitching state.
   const StitchPhase& GetStitchPhaseComponent() const { return m_stitch; }
 
  private:

@@ -27,6 +27,8 @@ class LUMEN_API PAParameter {
 
   /// Numerator and denominator (true, 0), not ratioed, id -1.
   PAParameter();
+  /// Numerator receiver (numReference, numIndex), denominator receiver (denReference,
+  /// denIndex), acquisition ID `id`, ratioed when `ratioed`.
   PAParameter(int numIndex, bool numReference, int denIndex, bool denReference, int id,
               bool ratioed);
   /// Ratioed when den.index > 0: a denominator of index 0 or below is not used.
@@ -49,6 +51,7 @@ class LUMEN_API PAParameter {
 
   /// Slots of the two receivers (PAReceiver::ToSlot).
   int GetNumeratorSlot(bool mappingFlag) const { return numerator.ToSlot(mappingFlag); }
+  /// Slot of the denominator receiver (PAReceiver::ToSlot).
   int GetDenominatorSlot(bool mappingFlag) const { return denominator.ToSlot(mappingFlag); }
 
   /// out = numerator value / denominator value of one point's receiver buffer, the

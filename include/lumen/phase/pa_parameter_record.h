@@ -19,9 +19,13 @@
 class LUMEN_API PAParameterRecord {
  public:
   PAParameterRecord() = default;
+  /// A copy; `count` is read once (acquire), so a record filled on another thread is copied at
+  /// one consistent count.
   PAParameterRecord(const PAParameterRecord& other);
+  /// Replaces every field by `other`'s, reading its `count` once as the copy constructor does.
   PAParameterRecord& operator=(const PAParameterRecord& other);
 
+  /// The values of the sweep, one per point.
   std::vector<LumenUtility::TsComplex> values;
   std::atomic<std::int32_t> count{0};  ///< completed values in `values`
   int begin = 0;                       ///< `count` at the consumer's last GetAvailableDataCount

@@ -19,10 +19,12 @@ class LUMEN_API PAReceiver {
   /// true: a reference receiver and `index` is a port number (1-based); false: a test receiver
   /// and `index` is the test set's receiver index, -1 for none.
   bool reference;
+  /// Port number or receiver index, see `reference`.
   std::int32_t index;
 
   /// The port-0 reference receiver (true, 0).
   PAReceiver() : reference(true), index(0) {}
+  /// The receiver (`isReference`, `receiverIndex`).
   PAReceiver(bool isReference, int receiverIndex) : reference(isReference), index(receiverIndex) {}
   /// Classifies a physical receiver number through the test set's ClassifyReceiver (`flag` is
   /// passed through). A negative number gives (false, -1) without asking; a number the test
@@ -36,6 +38,7 @@ class LUMEN_API PAReceiver {
     if (reference != other.reference) return reference;
     return index < other.index;
   }
+  /// Both fields equal.
   bool operator==(const PAReceiver& other) const = default;
 
   /// The test set's 0-based slot of this receiver in a per-point buffer. `mappingFlag` is

@@ -48,14 +48,22 @@ class LUMEN_API StitchPhase {
   /// disabled. Clamped to the int range.
   int ComputeNewSweepSize(int n) const;
 
+  /// True once SetPhaseStitch was given at least one break.
   bool IsEnabled() const { return m_enabled; }
+  /// Whether each break carries a capture and a realign point.
   bool HasReferencePoints() const { return m_hasReferencePoints; }
+  /// Points discarded at the start of each sweep.
   int GetLeadingPoints() const { return m_leadingPoints; }
+  /// Settling points discarded at each break.
   int GetPointsPerBreak() const { return m_pointsPerBreak; }
+  /// Position of the tracked receiver in a point buffer.
   int GetSlot() const { return m_slot; }
+  /// Points processed in the current sweep.
   int GetPointCounter() const { return m_pointCounter; }
   double GetPhaseOffset() const { return m_phaseOffset; }  ///< radians
+  /// The break points, as given.
   const std::vector<int>& GetBreaks() const { return m_breaks; }
+  /// The tracked receiver's value at the last capture point.
   LumenUtility::TsComplex GetReferenceValue() const { return m_referenceValue; }
 
  private:

@@ -34,6 +34,8 @@ class LUMEN_API CFileException : public std::exception {
     endOfFile = 14
   };
 
+  /// An exception of `cause` with the system error `osError` (errno; -1 for none) about the
+  /// file `fileName` (null: none named).
   explicit CFileException(int cause = none, std::int32_t osError = -1,
                           const wchar_t* fileName = nullptr);
 
@@ -53,8 +55,11 @@ class LUMEN_API CFileException : public std::exception {
   /// The message in UTF-8.
   const char* what() const noexcept override;
 
+  /// One of the causes above.
   int m_cause;
+  /// The system error number (errno); -1 when none.
   std::int32_t m_lOsError;
+  /// The file concerned; empty when none.
   std::wstring m_strFileName;
 
  private:

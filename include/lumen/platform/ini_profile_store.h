@@ -31,6 +31,7 @@ class LUMEN_API IniProfileStore : public IProfileStore {
   /// the first write); an empty path returns to memory. The entries held so far are not
   /// carried over either way. No file is touched by this call.
   void SetPath(const std::wstring& path);
+  /// The INI file path; empty while the profile is kept in memory.
   std::wstring GetPath() const;
 
   /// As IProfileStore. Reads give the default when the file cannot be read. Writes return 0,

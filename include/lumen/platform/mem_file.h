@@ -18,7 +18,9 @@
 class LUMEN_API CMemFile : public CFile {
  public:
   CMemFile() = default;
+  /// A file holding `bytes`, at position 0.
   explicit CMemFile(std::vector<std::uint8_t> bytes) : m_data(std::move(bytes)) {}
+  /// A file holding a copy of `count` bytes at `bytes`, at position 0.
   CMemFile(const void* bytes, std::size_t count);
 
   /// A memory file has no path to open: always 0, with genericException in `error`.
@@ -38,6 +40,7 @@ class LUMEN_API CMemFile : public CFile {
   void Close() override;
   void Abort() override { Close(); }
 
+  /// The file's bytes.
   const std::vector<std::uint8_t>& GetData() const { return m_data; }
   /// The bytes written so far; the file is left empty at position 0.
   std::vector<std::uint8_t> Detach();

@@ -19,6 +19,7 @@ class LUMEN_API MemoryTraceSink : public ITraceSink {
   void Consume(const TraceRecord& record) override;
   /// A copy of the events so far, in the order they arrived.
   std::vector<TraceRecord> Records() const;
+  /// Forgets the events so far.
   void Clear();
 
  private:

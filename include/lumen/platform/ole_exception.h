@@ -14,11 +14,13 @@
 
 class LUMEN_API COleException : public std::exception {
  public:
+  /// An exception of status code `sc`.
   explicit COleException(HRESULT sc);
 
   /// "OLE error 0x80070057" in UTF-8.
   const char* what() const noexcept override;
 
+  /// The status code.
   HRESULT m_sc;
 
  private:

@@ -21,13 +21,17 @@
 
 namespace LumenUtility {
 
+///@{
 /// The registry's type numbers of the values the library reads.
 inline constexpr std::uint32_t REG_SZ = 1;
 inline constexpr std::uint32_t REG_EXPAND_SZ = 2;
 inline constexpr std::uint32_t REG_BINARY = 3;
 inline constexpr std::uint32_t REG_DWORD = 4;
+///@}
 
+/// One value of the store: its type and, by type, its number or text.
 struct RegistryValue {
+  /// The registry type number.
   std::uint32_t type = REG_SZ;
   std::uint32_t dword = 0;  ///< the value of a REG_DWORD
   std::wstring text;        ///< the value of a REG_SZ or REG_EXPAND_SZ
@@ -54,7 +58,9 @@ class LUMEN_API RegistryStore {
   std::optional<std::wstring> QueryString(const std::wstring& keyPath,
                                           const std::wstring& name) const;
 
+  /// Number of values stored.
   std::size_t size() const { return m_values.size(); }
+  /// True when no value is stored.
   bool empty() const { return m_values.empty(); }
 
  private:

@@ -22,11 +22,15 @@ namespace LumenUtility {
 
 /// One event as a session records it.
 struct TraceRecord {
+  /// The provider that wrote it.
   GUID providerId;
+  /// The event's descriptor, as written.
   EVENT_DESCRIPTOR descriptor;
   /// QueryPerformanceCounter ticks (nanoseconds of the monotonic clock) when it was written.
   std::int64_t timestampNs;
+  /// The writing process.
   std::uint32_t processId;
+  /// The writing thread (the kernel's thread id).
   std::uint32_t threadId;
   /// The payload items, copied.
   std::vector<std::vector<std::uint8_t>> items;

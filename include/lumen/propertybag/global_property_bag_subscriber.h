@@ -17,8 +17,11 @@ namespace LumenUtility {
 class LUMEN_API GlobalPropertyBagSubscriber {
  public:
   GlobalPropertyBagSubscriber() = default;
+  /// Subscribes `target` (may be null: then nothing) to the changes of every bag.
   explicit GlobalPropertyBagSubscriber(IPropertyBagSubscriber* target);
+  /// Shares `other`'s subscription; it ends when the last copy goes.
   GlobalPropertyBagSubscriber(const GlobalPropertyBagSubscriber& other) = default;
+  /// Gives up this object's share of its subscription and shares `other`'s.
   GlobalPropertyBagSubscriber& operator=(const GlobalPropertyBagSubscriber& other);
   ~GlobalPropertyBagSubscriber();
 

@@ -34,7 +34,9 @@ class LUMEN_API GlobalSubscriberSet {
   void Insert(IPropertyBagSubscriber* subscriber);
   /// Removes `subscriber`; an absent one changes nothing.
   void Erase(IPropertyBagSubscriber* subscriber);
+  /// True when `subscriber` is in the set.
   bool Contains(const IPropertyBagSubscriber* subscriber) const;
+  /// Number of subscribers.
   std::size_t Size() const;
   /// Tells every subscriber, in ascending pointer order, that `key` of `bag` changed to
   /// `value` (each gets its own copy with references followed). Throws as AfxCheckError when a

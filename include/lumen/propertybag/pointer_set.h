@@ -38,6 +38,7 @@ class PointerSet {
     m_members.erase(at);
     return true;
   }
+  /// True when `member` is in the set.
   bool Contains(const T* member) const {
     return std::binary_search(m_members.begin(), m_members.end(), member, Less());
   }
@@ -47,7 +48,9 @@ class PointerSet {
                           : m_members.begin();
     return at == m_members.end() ? nullptr : *at;
   }
+  /// Number of members.
   std::size_t Size() const { return m_members.size(); }
+  /// True when the set has no members.
   bool Empty() const { return m_members.empty(); }
 
  private:

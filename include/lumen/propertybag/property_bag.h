@@ -50,6 +50,7 @@ class LUMEN_API PropertyBag {
   void RemoveAllItems();
   /// The item under `key`, or null.
   PropertyBagItem* GetItem(const std::string& key);
+  /// The item under `key`, or null.
   const PropertyBagItem* GetItem(const std::string& key) const;
   /// A shared reference to the item under `key`, or an empty pointer.
   boost::shared_ptr<PropertyBagItem> GetItemPtr(const std::string& key);
@@ -68,6 +69,7 @@ class LUMEN_API PropertyBag {
   /// `key` is the empty key. Throws std::bad_alloc or COleException (as AfxCheckError) when a
   /// copy fails; no further subscriber is called then.
   void SignalItemChange(const std::string& key, CComVariant value);
+  /// As above; a null `key` is the empty key.
   void SignalItemChange(const char* key, CComVariant value);
   /// Tells only the global subscribers, as SignalItemChange does, naming `bag`.
   static void GlobalSignalItemChange(PropertyBag* bag, const std::string& key, CComVariant value);
@@ -75,10 +77,15 @@ class LUMEN_API PropertyBag {
   /// Each subscriber is in a set at most once; null is ignored, erasing an absent one does
   /// nothing.
   void SubscribeChanges(IPropertyBagSubscriber* subscriber);
+  /// Removes a change subscriber; an absent one changes nothing.
   void UnsubscribeChanges(IPropertyBagSubscriber* subscriber);
+  /// Adds a destroy subscriber (null or present: nothing).
   void SubscribeDestroy(IPropertyBagSubscriberDestroy* subscriber);
+  /// Removes a destroy subscriber; an absent one changes nothing.
   void UnsubscribeDestroy(IPropertyBagSubscriberDestroy* subscriber);
+  /// Adds a subscriber to the changes of every bag (null or present: nothing).
   static void GlobalSubscribeChanges(IPropertyBagSubscriber* subscriber);
+  /// Removes a global subscriber; an absent one changes nothing.
   static void GlobalUnsubscribeChanges(IPropertyBagSubscriber* subscriber);
 
   /// Writes the item count (4 bytes), then per item in key order the key (converted from

@@ -34,8 +34,11 @@ class LUMEN_API PropertyBagItem {
 
  protected:
   PropertyBagItem() = default;
+  ///@{
+  /// For derived items; the base holds nothing.
   PropertyBagItem(const PropertyBagItem&) = default;
   PropertyBagItem& operator=(const PropertyBagItem&) = default;
+  ///@}
 };
 
 }  // namespace LumenUtility

@@ -19,8 +19,11 @@ namespace LumenUtility {
 class LUMEN_API PropertyBagSubscriber : public IPropertyBagSubscriberDestroy {
  public:
   PropertyBagSubscriber() = default;
+  /// Subscribes `target` to the changes of `bag`; either null: nothing is subscribed.
   PropertyBagSubscriber(PropertyBag* bag, IPropertyBagSubscriber* target);
+  /// Subscribes `other`'s target to `other`'s bag once more, for this object.
   PropertyBagSubscriber(const PropertyBagSubscriber& other);
+  /// Ends this object's subscription and subscribes as the copy constructor does.
   PropertyBagSubscriber& operator=(const PropertyBagSubscriber& other);
   virtual ~PropertyBagSubscriber();
 

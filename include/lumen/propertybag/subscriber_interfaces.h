@@ -16,6 +16,7 @@ namespace LumenUtility {
 
 class PropertyBag;
 
+/// Told of every change signalled on a bag it subscribed to.
 class IPropertyBagSubscriber {
  public:
   /// The item under `key` in `bag` changed to `value` (a by-value copy: references are already
@@ -27,6 +28,7 @@ class IPropertyBagSubscriber {
   ~IPropertyBagSubscriber() = default;
 };
 
+/// Told when a bag it subscribed to is destroyed.
 class IPropertyBagSubscriberDestroy {
  public:
   /// `bag` is being destroyed; its items and subscriber sets are still intact during the call,

@@ -36,7 +36,9 @@ class LUMEN_API Archive {
   Archive& operator=(const Archive&) = delete;
   ~Archive();
 
+  /// True for an archive that reads.
   bool IsLoading() const { return m_loading; }
+  /// True for an archive that writes.
   bool IsStoring() const { return !m_loading; }
   /// The file descriptor, or kInvalidHandle once there is none.
   int GetFile() const { return m_file; }

@@ -20,6 +20,7 @@
 
 namespace LumenUtility {
 
+/// Makes one new object of a registered kind, wrapped in boost::any.
 using FactoryCreator = boost::function<boost::any()>;
 
 /// The three operations keep this declaration order: it is the order of the virtual slots.

@@ -22,10 +22,12 @@
 
 namespace LumenUtility {
 
+///@{
 /// Categories in use: category 1 holds one object per measurement (index = measurement
 /// number), category 3 the application-wide service objects (index 0).
 inline constexpr int kHostCategoryMeasurement = 1;
 inline constexpr int kHostCategoryApplication = 3;
+///@}
 
 /// Returns the index of Interface in the process-wide type list, registering it on first use.
 template <class Interface>

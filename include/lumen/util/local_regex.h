@@ -25,8 +25,10 @@ class LUMEN_API LocalRegex : public std::wregex {
                                                 std::regex_constants::ECMAScript)
       : std::wregex(pattern, flags), m_pattern(std::move(pattern)), m_flags(flags) {}
 
+  /// The pattern text.
   const std::wstring& GetPattern() const { return m_pattern; }
 
+  /// Orders by pattern text, then flags, so that LocalRegex can key a std::map.
   bool operator<(const LocalRegex& other) const {
     if (m_pattern != other.m_pattern) return m_pattern < other.m_pattern;
     return m_flags < other.m_flags;

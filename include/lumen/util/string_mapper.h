@@ -23,6 +23,7 @@ namespace LumenUtility {
 class LUMEN_API StringMapper {
  public:
   StringMapper() = default;
+  /// A mapper of `patterns` (pattern, replacement).
   explicit StringMapper(std::map<LocalRegex, std::wstring> patterns)
       : m_patterns(std::move(patterns)) {}
 

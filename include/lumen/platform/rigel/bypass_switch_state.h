@@ -5,6 +5,7 @@
 
 namespace Vela {
 
+/// Position of a bypass switch: signal through the path element, or around it.
 enum BYPASS_SWITCH_STATE { BYPASS_SWITCH_THRU = 0, BYPASS_SWITCH_BYPASSED = 1 };
 
 }  // namespace Vela

@@ -21,10 +21,13 @@ class LUMEN_API CommandParameter {
   /// `parameter` may be empty; the entry then matches no parameter name.
   CommandParameter(std::wstring elementName, GenericParameter::Ptr parameter);
 
+  /// The hardware element's name.
   const std::wstring& element_name() const { return m_elementName; }
   /// The value's name, or an empty string when there is no value.
   std::wstring parameter_name() const;
+  /// The value; may be empty.
   const GenericParameter::Ptr& parameter() const { return m_parameter; }
+  /// Replaces the value.
   void set_parameter(GenericParameter::Ptr parameter) { m_parameter = std::move(parameter); }
 
  private:

@@ -22,6 +22,7 @@ namespace Rigel {
 
 class LUMEN_API CPCollection {
  public:
+  /// How entries are held.
   using Entry = boost::shared_ptr<CommandParameter>;
 
   /// The first entry of element `element` whose value is named `parameter`, or an empty
@@ -34,6 +35,7 @@ class LUMEN_API CPCollection {
   /// Removes the entry at `index`; returns false and changes nothing when there is none.
   bool remove(std::int32_t index);
 
+  /// Number of entries.
   std::uint32_t size() const { return static_cast<std::uint32_t>(m_entries.size()); }
   /// The entry at `index`, or an empty pointer past the end.
   Entry at(std::uint32_t index) const;

@@ -21,11 +21,14 @@ namespace Rigel {
 
 class LUMEN_API DataAcquisitionSpecification {
  public:
+  /// How dynamic dimensions are held.
   using Dimension = boost::shared_ptr<CPDimension>;
 
+  /// The static collection.
   CPCollection& get_static_spec() { return m_staticSpec; }
   /// The dynamic dimensions in order; an entry may be empty.
   std::vector<Dimension>& get_dynamic_spec() { return m_dynamicSpec; }
+  /// Number of dynamic dimensions, empty entries included.
   std::uint32_t get_number_of_dimensions() const;
   /// Dimension `index`, or an empty pointer past the end.
   Dimension get_dimension(std::uint32_t index) const;
