@@ -77,9 +77,11 @@ class LUMEN_API VNAMessageMarshaling {
   /// empty; fewer than 4 bytes consume nothing. Throws std::bad_alloc when memory runs out.
   void ReadFromBuffer(boost::shared_ptr<VNAMarshalObject>& p);
 
+  ///@{
   /// The registry: entries by type index, and by run-time type name.
   static std::vector<FACTORY_ENTRY*> sm_vector;
   static std::unordered_map<std::string, FACTORY_ENTRY*> sm_table;
+  ///@}
 
  private:
   /// The index registered for the class `name`, or -1.

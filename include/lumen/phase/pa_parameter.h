@@ -20,7 +20,7 @@ class LUMEN_API PAParameter {
  public:
   PAReceiver numerator;    ///< the receiver whose value is measured
   PAReceiver denominator;  ///< divided into the numerator when `ratioed`
-  bool ratioed;
+  bool ratioed;  ///< the value is numerator / denominator, else the numerator alone
   std::int32_t id;  ///< acquisition ID; -1 when not set
   /// The test set's port count once asked; -1 until then.
   mutable std::int32_t portCount;

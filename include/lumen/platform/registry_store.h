@@ -4,7 +4,7 @@
 /// system registry would answer them.
 ///
 /// Key paths and value names compare without regard to ASCII case, and a key path's trailing
-/// backslashes do not count ("HKEY_LOCAL_MACHINE\SOFTWARE\X\" is "hkey_local_machine\software\x").
+/// backslashes do not count (`HKEY_LOCAL_MACHINE\SOFTWARE\X\` is `hkey_local_machine\software\x`).
 /// Each value has the registry's type number. A typed query answers only a value of its type:
 /// a value of another type counts as absent, as it does for the readers of the registry.
 /// The process-wide store that library code reads is set through "lumen/platform/registry.h".

@@ -55,7 +55,9 @@ class LUMEN_API Archive {
   /// Throws "Archive Exception: Invalid file handle" unless the archive has a file.
   void CheckFile() const;
 
-  /// Typed writes and reads of 1-, 2-, 4- and 8-byte integers, float and double.
+  ///@{
+  /// Typed writes and reads of 1-, 2-, 4- and 8-byte integers, float and double, in the
+  /// machine's (little-endian) byte order; the errors are those of Write and Read.
   template <typename T>
   requires(std::is_arithmetic_v<T> && !std::is_same_v<T, bool> &&
            (sizeof(T) == 1 || sizeof(T) == 2 || sizeof(T) == 4 || sizeof(T) == 8)) Archive&
@@ -72,6 +74,7 @@ class LUMEN_API Archive {
     value = read;
     return *this;
   }
+  ///@}
 
  private:
   /// Brings at least `count` unread bytes into the buffer or throws.
