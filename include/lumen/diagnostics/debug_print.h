@@ -64,8 +64,8 @@ LUMEN_API void dprint(std::int32_t slot, const wchar_t* format, ...);
 /// The process has one instance, gDebugPrint; see the file description for the rules.
 class LUMEN_API CDebugPrint {
  public:
-  /// Where messages go: standard error, the debugger output stand-in, or the file named by
-  /// SetFileName.
+  /// Where messages go: the host's console object (SetConsolePrintDevice), the debugger
+  /// output stand-in, or the file named by SetFileName.
   enum OutputDevice : int { Console = 0, Debugger = 1, File = 2 };
 
   /// The start-up state: locked out, every slot off, only the debugger device on, no file
