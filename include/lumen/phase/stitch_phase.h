@@ -48,7 +48,7 @@ class LUMEN_API StitchPhase {
   /// disabled. Clamped to the int range.
   int ComputeNewSweepSize(int n) const;
 
-  /// True once SetPhaseStitch was given at least one break.
+  /// The `enabled` flag of the last SetState (false until then).
   bool IsEnabled() const { return m_enabled; }
   /// Whether each break carries a capture and a realign point.
   bool HasReferencePoints() const { return m_hasReferencePoints; }
@@ -63,7 +63,7 @@ class LUMEN_API StitchPhase {
   double GetPhaseOffset() const { return m_phaseOffset; }  ///< radians
   /// The break points, as given.
   const std::vector<int>& GetBreaks() const { return m_breaks; }
-  /// The tracked receiver's value at the last capture point.
+  /// The tracked receiver's value at the last capture point, with the phase offset applied.
   LumenUtility::TsComplex GetReferenceValue() const { return m_referenceValue; }
 
  private:
