@@ -20,9 +20,9 @@ namespace LumenUtility {
 /// Reads the configuration file at `path` and makes it the registry. The file is UTF-8 text:
 /// a "[key path]" line, then its "name = value" lines, a value being "dword:" and 1 to 8
 /// hexadecimal digits, "expand:" and a text, or a text (in double quotes to keep blanks);
-/// lines starting with ";" or "#" are comments. On failure throws CFileException (unreadable file) or
-/// LumenException LUMEN_E_BOUNDS (a malformed line, with its number, or a file over 1 MiB),
-/// and the registry stays as it was. Later changes to the file are read by calling again.
+/// lines starting with ";" or "#" are comments. On failure throws CFileException (unreadable
+/// file) or LumenException LUMEN_E_BOUNDS (a malformed line, with its number, or a file over
+/// 1 MiB), and the registry stays as it was. Later changes to the file are read by calling again.
 LUMEN_API void SetRegistryConfigurationFile(const std::wstring& path);
 
 /// Makes `store` the registry (an empty store empties it).

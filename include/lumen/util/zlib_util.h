@@ -8,8 +8,8 @@
 /// 4 GiB or more, archives that would pass 4 GiB and more than 65535 entries are not written.
 /// Paths are UTF-8 on disk; entry names are UTF-8, flagged as such when they are not plain
 /// ASCII, and bytes of an entry name that are not UTF-8 are extracted as U+FFFD. Every function
-/// reports success as its result and throws nothing but std::bad_alloc. Thread-safety: the functions
-/// share no state; calls on different files may run in parallel.
+/// reports success as its result and throws nothing but std::bad_alloc. Thread-safety: the
+/// functions share no state; calls on different files may run in parallel.
 #pragma once
 
 #include <string>
