@@ -3,7 +3,7 @@
 set -euo pipefail
 packages=(cmake ninja-build g++ clang libclang-rt-14-dev pkg-config libboost-dev zlib1g-dev
           libgtest-dev libgmock-dev libbenchmark-dev libcli11-dev librsvg2-bin python3
-          zip unzip p7zip-full)
+          zip unzip p7zip-full doxygen)
 missing=()
 for p in "${packages[@]}"; do
   dpkg-query -W -f='${Status}' "$p" 2>/dev/null | grep -q "install ok installed" || missing+=("$p")

@@ -1,5 +1,7 @@
-// NoCopy: the base of classes that must not be copied. It has no fields and no behaviour of
-// its own, so it adds nothing to thread-safety or ownership.
+/** @file */
+/// @class NoCopy
+/// NoCopy: the base of classes that must not be copied. It has no fields and no behaviour of
+/// its own, so it adds nothing to thread-safety or ownership.
 #pragma once
 
 class NoCopy {

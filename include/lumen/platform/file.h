@@ -1,5 +1,6 @@
-// File stand-ins: CFile (buffered disk file), CMemFile (memory), CStdioFile (lines of text)
-// and the CFileException they throw.
+/// @file
+/// File stand-ins: CFile (buffered disk file), CMemFile (memory), CStdioFile (lines of text)
+/// and the CFileException they throw.
 #pragma once
 
 #include "lumen/platform/cfile.h"

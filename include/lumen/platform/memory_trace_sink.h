@@ -1,7 +1,9 @@
-// MemoryTraceSink: a session sink that keeps every event it is given, for tests and for hosts
-// that look at events in process.
-// Thread-safety: Consume may run on several threads at once and alongside Records and Clear.
-// Ownership: owns copies of the records.
+/** @file */
+/// @class LumenUtility::MemoryTraceSink
+/// MemoryTraceSink: a session sink that keeps every event it is given, for tests and for hosts
+/// that look at events in process.
+/// Thread-safety: Consume may run on several threads at once and alongside Records and Clear.
+/// Ownership: owns copies of the records.
 #pragma once
 
 #include <mutex>
@@ -15,8 +17,9 @@ namespace LumenUtility {
 class LUMEN_API MemoryTraceSink : public ITraceSink {
  public:
   void Consume(const TraceRecord& record) override;
-  // A copy of the events so far, in the order they arrived.
+  /// A copy of the events so far, in the order they arrived.
   std::vector<TraceRecord> Records() const;
+  /// Forgets the events so far.
   void Clear();
 
  private:

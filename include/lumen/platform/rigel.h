@@ -1,4 +1,5 @@
-// The hardware-interface library's acquisition specification and parameter values.
+/// @file
+/// The hardware-interface library's acquisition specification and parameter values.
 #pragma once
 
 #include "lumen/platform/rigel/bypass_switch_state.h"
