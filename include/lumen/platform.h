@@ -1,6 +1,7 @@
 // Platform base: result codes, the library exception, text conversions, files and archives,
 // and the stand-ins for the host's profile, debugger output, sound, event tracing, registry,
-// main window and hardware-interface library, and the COM variant.
+// main window and hardware-interface library, the COM variant, and shared libraries loaded
+// by module name.
 #pragma once
 
 #include "lumen/export.h"
@@ -23,3 +24,4 @@
 #include "lumen/platform/rigel.h"
 #include "lumen/platform/com_variant.h"
 #include "lumen/platform/ole_exception.h"
+#include "lumen/platform/shared_library.h"
