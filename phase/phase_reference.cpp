@@ -47,8 +47,8 @@ int ReadDriverText(Func entry, int device, std::wstring& text) {
   std::array<char, kTextBufferBytes> buffer{};
   const int code = entry(buffer.data(), device);
   if (code == 0) {
-    text = LumenUtility::Utf8ToWide(std::string_view(buffer.data(), strnlen(buffer.data(),
-                                                                            buffer.size())));
+    text = LumenUtility::Utf8ToWide(
+        std::string_view(buffer.data(), strnlen(buffer.data(), buffer.size())));
   }
   return code;
 }
@@ -120,12 +120,23 @@ void PhaseReference::SetupReference(int device, int divide) {
   }
   RatioFunc makeRatio = nullptr;
   switch (divide) {
-    case 1: makeRatio = m_makeRatio1Func; break;
-    case 2: makeRatio = m_makeRatio2Func; break;
-    case 4: makeRatio = m_makeRatio4Func; break;
-    case 8: makeRatio = m_makeRatio8Func; break;
-    case 16: makeRatio = m_makeRatio16Func; break;
-    default: throw LumenException(L"Invalid argument for setting up phase reference.");
+    case 1:
+      makeRatio = m_makeRatio1Func;
+      break;
+    case 2:
+      makeRatio = m_makeRatio2Func;
+      break;
+    case 4:
+      makeRatio = m_makeRatio4Func;
+      break;
+    case 8:
+      makeRatio = m_makeRatio8Func;
+      break;
+    case 16:
+      makeRatio = m_makeRatio16Func;
+      break;
+    default:
+      throw LumenException(L"Invalid argument for setting up phase reference.");
   }
   if (const int code = Require(makeRatio)(device); code != 0) {
     ThrowDeviceError(L"Could not set the divide setting on the phase reference.", code);

@@ -55,13 +55,13 @@ TEST_F(PrnReaderTest, LineExamplesGiveTheirPointsAndHeaderAndZeroLinesAreSkipped
 TEST_F(PrnReaderTest, LinesWithoutTwoFiniteNumbersAreSkipped) {
   const PrnReader reader = Load(
       "abc,12\n"
-      "3e9,abc\n"      // no phase: not a calibration point of 0 degrees
+      "3e9,abc\n"  // no phase: not a calibration point of 0 degrees
       "4e9\n"
       ",,5e9,\n"
       "5e9, \n"
       "nan,4\n"
       "6e9,inf\n"
-      "1e400,3\n"      // overflows
+      "1e400,3\n"  // overflows
       "  7e9 Hz , 30 deg\n"
       "8e9,60\r\n");
   EXPECT_EQ(Points(reader), (std::vector<double>{7e9, 8e9}));

@@ -13,8 +13,7 @@ std::string SharedObjectFileName(std::wstring_view moduleName) {
       slash == std::wstring_view::npos ? std::wstring_view() : moduleName.substr(0, slash + 1);
   std::wstring_view stem = moduleName.substr(directory.size());
   constexpr std::wstring_view kDll = L".dll";
-  if (stem.size() > kDll.size() &&
-      EqualsNoCase(stem.substr(stem.size() - kDll.size()), kDll)) {
+  if (stem.size() > kDll.size() && EqualsNoCase(stem.substr(stem.size() - kDll.size()), kDll)) {
     stem.remove_suffix(kDll.size());
   }
   if (stem.empty()) return std::string();

@@ -51,7 +51,8 @@ struct Simulator {
   Simulator() {
     for (int d = 0; d < FERRULE_SIM_MAX_DEVICES; ++d) {
       devices[d].model = "Ferrule rev7 (simulated)";
-      devices[d].serialNumber = "FR7-SIM-" + std::string(d < 9 ? "000" : "00") + std::to_string(d + 1);
+      devices[d].serialNumber =
+          "FR7-SIM-" + std::string(d < 9 ? "000" : "00") + std::to_string(d + 1);
     }
   }
 };
@@ -117,11 +118,21 @@ FERRULE_EXPORT int getNumConnectedDevice() {
   return State().deviceCount;
 }
 
-FERRULE_EXPORT int makeRatio1(int device) { return MakeRatio(kRatio1, 1, device); }
-FERRULE_EXPORT int makeRatio2(int device) { return MakeRatio(kRatio2, 2, device); }
-FERRULE_EXPORT int makeRatio4(int device) { return MakeRatio(kRatio4, 4, device); }
-FERRULE_EXPORT int makeRatio8(int device) { return MakeRatio(kRatio8, 8, device); }
-FERRULE_EXPORT int makeRatio16(int device) { return MakeRatio(kRatio16, 16, device); }
+FERRULE_EXPORT int makeRatio1(int device) {
+  return MakeRatio(kRatio1, 1, device);
+}
+FERRULE_EXPORT int makeRatio2(int device) {
+  return MakeRatio(kRatio2, 2, device);
+}
+FERRULE_EXPORT int makeRatio4(int device) {
+  return MakeRatio(kRatio4, 4, device);
+}
+FERRULE_EXPORT int makeRatio8(int device) {
+  return MakeRatio(kRatio8, 8, device);
+}
+FERRULE_EXPORT int makeRatio16(int device) {
+  return MakeRatio(kRatio16, 16, device);
+}
 
 FERRULE_EXPORT int getSerialNumber(char* buffer, int device) {
   if (const int failure = Enter(kSerial)) return failure;
@@ -139,11 +150,14 @@ FERRULE_EXPORT int getModel(char* buffer, int device) {
 }
 #endif
 
-FERRULE_EXPORT void ferruleSimReset(void) { State() = Simulator(); }
+FERRULE_EXPORT void ferruleSimReset(void) {
+  State() = Simulator();
+}
 
 FERRULE_EXPORT void ferruleSimSetDeviceCount(int count) {
-  State().deviceCount = count < 0 ? 0 : count > FERRULE_SIM_MAX_DEVICES ? FERRULE_SIM_MAX_DEVICES
-                                                                        : count;
+  State().deviceCount = count < 0                         ? 0
+                        : count > FERRULE_SIM_MAX_DEVICES ? FERRULE_SIM_MAX_DEVICES
+                                                          : count;
 }
 
 FERRULE_EXPORT int ferruleSimSetModel(int device, const char* text) {
@@ -170,4 +184,6 @@ FERRULE_EXPORT int ferruleSimDivideRatio(int device) {
   return ValidDevice(device) ? State().devices[device].divideRatio : 0;
 }
 
-FERRULE_EXPORT const char* ferruleSimLastAccess(void) { return State().lastAccess.c_str(); }
+FERRULE_EXPORT const char* ferruleSimLastAccess(void) {
+  return State().lastAccess.c_str();
+}

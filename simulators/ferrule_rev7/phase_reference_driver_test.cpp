@@ -151,9 +151,9 @@ TEST_F(PhaseReferenceDriver, EachFailingCallThrowsItsMessageWithTheDeviceCode) {
   for (int divide : {1, 2, 4, 8, 16}) {
     const std::string name = "makeRatio" + std::to_string(divide);
     sim->setFailure(name.c_str(), 40 + divide);
-    ExpectPhaseReferenceError(
-        [&] { reference.SetupReference(0, divide); },
-        L"Could not set the divide setting on the phase reference.:" + std::to_wstring(40 + divide));
+    ExpectPhaseReferenceError([&] { reference.SetupReference(0, divide); },
+                              L"Could not set the divide setting on the phase reference.:" +
+                                  std::to_wstring(40 + divide));
   }
   sim->setFailure("getModel", -5);
   ExpectPhaseReferenceError([&] { reference.GetModel(0); },

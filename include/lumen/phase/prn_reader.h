@@ -46,10 +46,9 @@ class LUMEN_API PrnReader {
   /// stimulus point. The second and third arguments are not used. Throws kPhaseLookupFailed
   /// (0xE802029D) as a bare std::int32_t when the reader holds no points or when the first or
   /// last stimulus point lies outside the file's frequency range.
-  std::vector<LumenUtility::TsComplex> GetPhase(const LumenUtility::InputArray& stimulus,
-                                                const LumenUtility::InputArray& unused = {},
-                                                const LumenUtility::TsComplex* unusedData =
-                                                    nullptr) const;
+  std::vector<LumenUtility::TsComplex> GetPhase(
+      const LumenUtility::InputArray& stimulus, const LumenUtility::InputArray& unused = {},
+      const LumenUtility::TsComplex* unusedData = nullptr) const;
 
   /// The frequencies of the points loaded, in the file's line order.
   const LumenUtility::InputArray& GetStimulus() const { return m_stimulus; }
