@@ -1,9 +1,6 @@
 // Reads arbitrary bytes as a PRN calibration file, then looks the phase up on the file's own
 // points and on a sweep across its range. Loading always succeeds and gives one unit phasor
 // per finite point; the lookups give one value per point asked for or the lookup code.
-#include <sys/mman.h>
-#include <unistd.h>
-
 #include <algorithm>
 #include <cmath>
 #include <cstddef>
@@ -13,29 +10,15 @@
 #include <vector>
 
 #include "lumen/phase/prn_reader.h"
+#include "memory_file.h"
 
 namespace {
+
+using lumen_fuzz::MemoryFile;
 
 void Check(bool condition) {
   if (!condition) __builtin_trap();
 }
-
-// A file holding the input, as a path the reader can open.
-class MemoryFile {
- public:
-  MemoryFile(const std::uint8_t* data, std::size_t size) : m_fd(memfd_create("prn", MFD_CLOEXEC)) {
-    Check(m_fd >= 0 && write(m_fd, data, size) == static_cast<ssize_t>(size));
-    std::snprintf(m_path, sizeof m_path, "/proc/self/fd/%d", m_fd);
-  }
-  ~MemoryFile() { close(m_fd); }
-  std::wstring Path() const {
-    return std::wstring(m_path, m_path + std::char_traits<char>::length(m_path));
-  }
-
- private:
-  int m_fd;
-  char m_path[64];
-};
 
 void CheckLookup(const PrnReader& reader, const LumenUtility::InputArray& sweep) {
   try {
