@@ -1,9 +1,6 @@
 // Reads arbitrary bytes as a CSV file, field by field to the end, twice: alone, and after a
 // first line of 0 to 10 characters (the first byte's choice) that shifts the text against the
 // 10-byte reads. Both must give the same fields and statuses, within the documented ranges.
-#include <sys/mman.h>
-#include <unistd.h>
-
 #include <cstddef>
 #include <cstdint>
 #include <cstdio>
@@ -11,32 +8,17 @@
 #include <vector>
 
 #include "lumen/data.h"
+#include "memory_file.h"
 
 namespace {
+
+using lumen_fuzz::MemoryFile;
 
 struct Token {
   int ok;
   unsigned status;
   std::string field;
   bool operator==(const Token&) const = default;
-};
-
-// A file holding `text`, as a path the CSV file can open.
-class MemoryFile {
- public:
-  explicit MemoryFile(const std::string& text) : m_fd(memfd_create("csv", MFD_CLOEXEC)) {
-    if (m_fd < 0 || write(m_fd, text.data(), text.size()) != static_cast<ssize_t>(text.size()))
-      __builtin_trap();
-    std::snprintf(m_path, sizeof m_path, "/proc/self/fd/%d", m_fd);
-  }
-  ~MemoryFile() { close(m_fd); }
-  std::wstring Path() const {
-    return std::wstring(m_path, m_path + std::char_traits<char>::length(m_path));
-  }
-
- private:
-  int m_fd;
-  char m_path[64];
 };
 
 void Check(bool condition) {

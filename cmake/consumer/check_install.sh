@@ -8,6 +8,11 @@ scratch=$2
 here=$(cd "$(dirname "$0")" && pwd)
 rm -rf "$scratch"
 cmake --install "$build" --prefix "$scratch/prefix" >/dev/null
+# Simulated drivers are for tests and development machines, never part of the package.
+if find "$scratch/prefix" -name 'libFerrule*' | grep -q .; then
+  echo "a simulated driver was installed" >&2
+  exit 1
+fi
 export PKG_CONFIG_PATH="$scratch/prefix/lib/pkgconfig:$scratch/prefix/lib/x86_64-linux-gnu/pkgconfig"
 cmake -S "$here" -B "$scratch/build" -G Ninja -DCMAKE_PREFIX_PATH="$scratch/prefix" >/dev/null
 cmake --build "$scratch/build" >/dev/null

@@ -1,6 +1,7 @@
 /// @file
 /// Phase-coherent acquisition: receivers and ratio parameters, phase stitching across band
-/// breaks, and the component that collects, averages and streams the data of a sweep.
+/// breaks, the component that collects, averages and streams the data of a sweep, and the
+/// external phase reference device with its calibration (PRN) file.
 ///
 /// The measurement engine registers PAParameters with a PAComponent, starts each sweep with
 /// SetSweepParameters and hands every raw receiver buffer to PutData; the component forms the
@@ -22,4 +23,6 @@
 #include "lumen/phase/pa_parameter.h"
 #include "lumen/phase/pa_parameter_record.h"
 #include "lumen/phase/pa_receiver.h"
+#include "lumen/phase/phase_reference.h"
+#include "lumen/phase/prn_reader.h"
 #include "lumen/phase/stitch_phase.h"

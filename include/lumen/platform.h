@@ -1,7 +1,8 @@
 /// @file
 /// Platform base: result codes, the library exception, text conversions, files and archives,
 /// and the stand-ins for the host's profile, debugger output, sound, event tracing, registry,
-/// main window and hardware-interface library, and the COM variant.
+/// main window and hardware-interface library, the COM variant, and shared libraries loaded by
+/// module name.
 ///
 /// LumenException carries an HRESULT and wide messages; what() gives "0xCODE: message" in UTF-8.
 /// Text converts between UTF-8, UTF-16 and wide strings without throwing (ill-formed input becomes
@@ -52,3 +53,4 @@
 #include "lumen/platform/rigel.h"
 #include "lumen/platform/com_variant.h"
 #include "lumen/platform/ole_exception.h"
+#include "lumen/platform/shared_library.h"

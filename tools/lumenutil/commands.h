@@ -19,4 +19,7 @@ void AddCaptureCommand(CLI::App& app);
 // Adds `zip OUT [-C DIR] FILES...` and `unzip IN -d DIR`.
 void AddZipCommands(CLI::App& app);
 
+// Adds `prn FILE [--start F --stop F --points N]`: the phase of a PRN calibration file.
+void AddPrnCommand(CLI::App& app);
+
 }  // namespace lumenutil

@@ -37,6 +37,7 @@ int main(int argc, char** argv) {
   lumenutil::AddSnpCommand(app);
   lumenutil::AddCaptureCommand(app);
   lumenutil::AddZipCommands(app);
+  lumenutil::AddPrnCommand(app);
   try {
     app.parse(argc, argv);
   } catch (const CLI::ParseError& e) {

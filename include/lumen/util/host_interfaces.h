@@ -48,12 +48,14 @@ class AI_IFIFO {
   virtual void Write(const LumenUtility::TsComplex* values, int count) = 0;
 };
 
-/// Diagnostic feature switches. Looked up under category 3, index 0; a missing object means
-/// every feature is off.
+/// Diagnostic feature switches of the host. Looked up under category 3, index 0; a missing
+/// object means every feature is off. The library asks for "SimulatePhaseRef" (the phase
+/// reference device is simulated while it is on).
 class IDiagFeaturesInterface {
  public:
+  /// Host objects are not deleted through this interface by the library.
   virtual ~IDiagFeaturesInterface() = default;
-  /// Whether the named feature (for example "SimulatePhaseRef") is on.
+  /// Whether the diagnostic feature `name` (for example "SimulatePhaseRef") is on.
   virtual bool IsFeatureOn(const std::wstring& name) = 0;
 };
 
