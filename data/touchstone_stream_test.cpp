@@ -5,32 +5,18 @@
 #include <unistd.h>
 
 #include <algorithm>
-#include <cstring>
 #include <string>
 #include <thread>
 #include <vector>
 
+#include "data/testing/chunk_source.h"
 #include "data/touchstone_parser.h"
 #include "lumen/data.h"
 
 namespace LumenUtility {
 namespace {
 
-// Gives `text` in pieces of at most `chunk` bytes, as a pipe may.
-class ChunkSource : public TouchstoneSource {
- public:
-  ChunkSource(std::string_view text, std::size_t chunk) : m_text(text), m_chunk(chunk) {}
-  std::size_t Read(char* buffer, std::size_t capacity) override {
-    const std::size_t count = std::min({capacity, m_chunk, m_text.size()});
-    std::memcpy(buffer, m_text.data(), count);
-    m_text.remove_prefix(count);
-    return count;
-  }
-
- private:
-  std::string_view m_text;
-  std::size_t m_chunk;
-};
+using fixtures::ChunkSource;
 
 struct Outcome {
   bool read;

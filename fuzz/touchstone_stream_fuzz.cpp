@@ -1,32 +1,12 @@
 // Differential target: Touchstone text read in chunks must parse exactly as the same text in
 // memory. The first byte picks the port count (1 to 4), the second the chunk size (1 to 256
 // bytes); the rest is the file's text. Any difference in outcome, message or content traps.
-#include <algorithm>
 #include <cstddef>
 #include <cstdint>
-#include <cstring>
 #include <string_view>
 
+#include "data/testing/chunk_source.h"
 #include "data/touchstone_parser.h"
-
-namespace {
-
-class ChunkSource : public LumenUtility::TouchstoneSource {
- public:
-  ChunkSource(std::string_view text, std::size_t chunk) : m_text(text), m_chunk(chunk) {}
-  std::size_t Read(char* buffer, std::size_t capacity) override {
-    const std::size_t count = std::min({capacity, m_chunk, m_text.size()});
-    std::memcpy(buffer, m_text.data(), count);
-    m_text.remove_prefix(count);
-    return count;
-  }
-
- private:
-  std::string_view m_text;
-  std::size_t m_chunk;
-};
-
-}  // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   if (size < 2) return 0;
@@ -37,7 +17,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
   LumenUtility::TouchstoneContent inMemory, streamed;
   LumenUtility::TouchstoneParser memoryParser(text, ports);
   const bool memoryRead = memoryParser.Parse(inMemory);
-  ChunkSource source(text, chunk);
+  LumenUtility::fixtures::ChunkSource source(text, chunk);
   LumenUtility::TouchstoneParser streamParser(source, ports);
   const bool streamRead = streamParser.Parse(streamed);
 

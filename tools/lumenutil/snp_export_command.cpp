@@ -33,9 +33,8 @@ void WriteTable(const ExportOptions& options, std::ostream& out) {
     return;
   }
   const SnPFileInfo& info = file.GetFileInfo();
-  const TraceFormat format = TraceFormatFromName(options.format);
-  if (info.parameter != 'S' &&
-      (format == TraceFormat::kSWR || format == TraceFormat::kZ || format == TraceFormat::kY)) {
+  const TraceFormatRow& format = TraceFormatNamed(options.format);
+  if (info.parameter != 'S' && format.asReflection) {
     std::cerr << "lumenutil snp export: warning: " << options.path << " holds " << info.parameter
               << "-parameters; " << options.format << " treats them as reflection coefficients\n";
   }
@@ -46,9 +45,8 @@ void WriteTable(const ExportOptions& options, std::ostream& out) {
   std::vector<std::vector<double>> columns;
   for (const MatrixPosition& p : positions) {
     for (const std::string& name : ColumnNames(format, p.name)) out << d << name;
-    const bool needsZ0 = format == TraceFormat::kZ || format == TraceFormat::kY;
-    const double z0 = needsZ0 ? PortReference(file, p.row, options.path) : 0.0;
-    for (std::vector<double>& column : FormatColumns(TraceAt(file, p).GetData(), format, z0)) {
+    const double z0 = format.needsReference ? PortReference(file, p.row, options.path) : 0.0;
+    for (std::vector<double>& column : format.convert(TraceAt(file, p).GetData(), z0)) {
       columns.push_back(std::move(column));
     }
   }
@@ -91,10 +89,8 @@ void AddSnpExportCommand(CLI::App& snp) {
       command->add_option("--params,-p", options->params,
                           "comma-separated traces, e.g. S21,S11 (default: all, in file order)");
   CLI::Option* format =
-      command->add_option("--format,-f", options->format,
-                          "ri, ma (linear magnitude, degrees), db (dB, degrees), logmag, phase, "
-                          "uphase (unwrapped), swr, z (ohms), y (siemens)");
-  format->check(CLI::IsMember(TraceFormatNames()))->capture_default_str();
+      command->add_option("--format,-f", options->format, TraceFormatHelp(kExportFormat));
+  format->check(CLI::IsMember(TraceFormatNames(kExportFormat)))->capture_default_str();
   command
       ->add_flag("--noise", options->noise,
                  "the noise records instead: frequency, NFmin (dB), |GammaOpt|, its angle "

@@ -45,28 +45,37 @@ ChartSeries BreakAtWraps(ChartSeries s) {
   return out;
 }
 
-std::string RenderNoiseFigure(const PlotOptions& options, const CSnPFileBase& file) {
+// A chart over the stimulus, titled and labelled as `format` says.
+CartesianChart ChartOver(const StimulusAxis& axis, const std::string& path,
+                         const TraceFormatRow& format) {
+  CartesianChart chart;
+  chart.title = BaseName(path) + ": " + format.chartTitle;
+  chart.xQuantity = axis.quantity;
+  chart.xUnit = axis.unit;
+  chart.xSiPrefix = axis.siPrefix;
+  chart.yLabel = format.axisLabel;
+  return chart;
+}
+
+std::string RenderNoiseFigure(const PlotOptions& options, const CSnPFileBase& file,
+                              const TraceFormatRow& format) {
   ChartSeries nf{"NFmin", {}, {}};
   for (const NoiseRecord& r : RequireNoiseRecords(file, options.path)) {
     nf.x.push_back(r.stimulus);
     nf.y.push_back(r.nfMinDb);
   }
-  const StimulusAxis axis = AxisOf(file.GetResultType());
-  CartesianChart chart;
-  chart.title = BaseName(options.path) + ": minimum noise figure";
-  chart.xQuantity = axis.quantity;
-  chart.xUnit = axis.unit;
-  chart.xSiPrefix = axis.siPrefix;
-  chart.yLabel = "NFmin (dB)";
+  CartesianChart chart = ChartOver(AxisOf(file.GetResultType()), options.path, format);
   chart.series.push_back(std::move(nf));
   return RenderCartesianSvg(chart);
 }
 
 std::string Render(const PlotOptions& options) {
+  const TraceFormatRow& format = TraceFormatNamed(options.format);
   const CSnPFileBase file = ReadTouchstone(options.path, options.ports);
-  if (options.format == "nf") return RenderNoiseFigure(options, file);
+  if (format.plot == PlotKind::kNoiseFigure) return RenderNoiseFigure(options, file, format);
   std::vector<MatrixPosition> positions = SelectPositions(options.params, file);
-  if (options.format == "smith" && options.params.empty()) {
+  const bool smith = format.plot == PlotKind::kSmithChart;
+  if (smith && options.params.empty()) {
     // A Smith chart shows reflections; transmissions would only cross it.
     std::erase_if(positions, [](const MatrixPosition& p) { return p.row != p.column; });
   }
@@ -78,28 +87,20 @@ std::string Render(const PlotOptions& options) {
   }
   const std::vector<double> x = file.GetParam(SNP_S11).GetStimulus().GetArray();
   std::vector<ChartSeries> series;
-  if (options.format == "smith") {
-    for (const MatrixPosition& p : positions) {
-      const std::vector<std::vector<double>> ri =
-          FormatColumns(TraceAt(file, p).GetData(), TraceFormat::kRI, 0);
-      series.push_back({p.name, ri[0], ri[1]});
-    }
-    return RenderSmithSvg(BaseName(options.path) + ": Smith chart", series);
-  }
-  const bool phase = options.format == "phase";
   for (const MatrixPosition& p : positions) {
-    const TraceFormat format = phase ? TraceFormat::kPhase : TraceFormat::kLogMag;
-    ChartSeries trace{p.name, x, FormatColumns(TraceAt(file, p).GetData(), format, 0)[0]};
-    series.push_back(phase ? BreakAtWraps(std::move(trace)) : std::move(trace));
+    const double z0 = format.needsReference ? PortReference(file, p.row, options.path) : 0.0;
+    std::vector<std::vector<double>> columns = format.convert(TraceAt(file, p).GetData(), z0);
+    if (smith) {
+      series.push_back({p.name, std::move(columns[0]), std::move(columns[1])});
+    } else {
+      ChartSeries trace{p.name, x, std::move(columns[0])};
+      const bool wraps = format.plot == PlotKind::kWrappedPhase;
+      series.push_back(wraps ? BreakAtWraps(std::move(trace)) : std::move(trace));
+    }
   }
-  const StimulusAxis axis = AxisOf(file.GetResultType());
-  CartesianChart chart;
-  chart.title = BaseName(options.path) + (phase ? ": phase" : ": log magnitude");
-  chart.xQuantity = axis.quantity;
-  chart.xUnit = axis.unit;
-  chart.xSiPrefix = axis.siPrefix;
-  chart.yLabel = phase ? "Phase (degrees)" : "Magnitude (dB)";
-  if (phase) {
+  if (smith) return RenderSmithSvg(BaseName(options.path) + ": " + format.chartTitle, series);
+  CartesianChart chart = ChartOver(AxisOf(file.GetResultType()), options.path, format);
+  if (format.plot == PlotKind::kWrappedPhase) {
     chart.fixedY = true;
     chart.yMin = -180;
     chart.yMax = 180;
@@ -126,9 +127,8 @@ void AddSnpPlotCommand(CLI::App& snp) {
   command->add_option("FILE", options->path, "Touchstone file")->required();
   command->add_option("--output,-o", options->output, "SVG file to write")->required();
   command
-      ->add_option("--format,-f", options->format,
-                   "logmag, phase, smith, or nf (minimum noise figure of the noise data)")
-      ->check(CLI::IsMember({"logmag", "phase", "smith", "nf"}))
+      ->add_option("--format,-f", options->format, TraceFormatHelp(kPlotFormat))
+      ->check(CLI::IsMember(TraceFormatNames(kPlotFormat)))
       ->capture_default_str();
   command->add_option("--params,-p", options->params,
                       "comma-separated traces, e.g. S21,S11 (default: all; for smith, the "
