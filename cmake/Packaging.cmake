@@ -64,24 +64,32 @@ set(CPACK_DEBIAN_PACKAGE_CONTROL_STRICT_PERMISSION ON)
 # Run-time dependencies come from the binaries (dpkg-shlibdeps); the packages of the same
 # build depend on each other at exactly this version.
 set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS ON)
+# dpkg-shlibdeps runs in each component's staging directory; the tool's finds the library it
+# links in the runtime component's tree beside it (its dependency is the exact one below).
+set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS_PRIVATE_DIRS ../runtime/usr/${CMAKE_INSTALL_LIBDIR})
 set(CPACK_DEBIAN_ENABLE_COMPONENT_DEPENDS ON)
 set(CPACK_COMPONENT_DEVELOPMENT_DEPENDS runtime)
 set(CPACK_COMPONENT_TOOL_DEPENDS runtime)
 
 set(CPACK_DEBIAN_RUNTIME_PACKAGE_NAME ${LUMEN_DEB_LIBRARY})
 set(CPACK_DEBIAN_RUNTIME_PACKAGE_SECTION libs)
-# A shlibs file, so that programs built against the library depend on this version or later.
-set(CPACK_DEBIAN_RUNTIME_PACKAGE_GENERATE_SHLIBS ON)
+# A shlibs file, so that programs built against the library depend on this version or later
+# (only the runtime package holds a shared object).
+set(CPACK_DEBIAN_PACKAGE_GENERATE_SHLIBS ON)
 set(CPACK_DEBIAN_PACKAGE_GENERATE_SHLIBS_POLICY ">=")
+# The linker cache is refreshed through dpkg's ldconfig trigger, as Debian wants; the package's
+# own postinst and postrm keep CPack from writing scripts that call ldconfig directly.
+set(CPACK_DEBIAN_RUNTIME_PACKAGE_CONTROL_EXTRA ${PROJECT_SOURCE_DIR}/packaging/triggers
+    ${PROJECT_SOURCE_DIR}/packaging/postinst ${PROJECT_SOURCE_DIR}/packaging/postrm)
 set(CPACK_DEBIAN_RUNTIME_DESCRIPTION
 "utility library of vector network analyzer measurement software
- lumen-utility is the shared C++ library of a vector network analyzer's
- measurement software: complex values and trace formats, stimulus arrays,
- interpolation, Touchstone and CSV readers, phase-coherent acquisition,
- property bags, interprocess messages, shared-memory data capture,
- diagnostics, global instrument settings and ZIP archiving.
- .
- This package holds the shared library.")
+lumen-utility is the shared C++ library of a vector network analyzer's
+measurement software: complex values and trace formats, stimulus arrays,
+interpolation, Touchstone and CSV readers, phase-coherent acquisition,
+property bags, interprocess messages, shared-memory data capture,
+diagnostics, global instrument settings and ZIP archiving.
+
+This package holds the shared library.")
 
 set(CPACK_DEBIAN_DEVELOPMENT_PACKAGE_NAME liblumenutility-dev)
 set(CPACK_DEBIAN_DEVELOPMENT_PACKAGE_SECTION libdevel)
@@ -89,20 +97,20 @@ set(CPACK_DEBIAN_DEVELOPMENT_PACKAGE_SECTION libdevel)
 set(CPACK_DEBIAN_DEVELOPMENT_PACKAGE_DEPENDS "libboost-dev (>= 1.74)")
 set(CPACK_DEBIAN_DEVELOPMENT_DESCRIPTION
 "utility library of vector network analyzer software - development files
- lumen-utility is the shared C++ library of a vector network analyzer's
- measurement software.
- .
- This package holds the C++20 headers, the link library, the CMake package
- (find_package(LumenUtility), target LumenUtility::lumenutility) and the
- pkg-config file (lumenutility).")
+lumen-utility is the shared C++ library of a vector network analyzer's
+measurement software.
+
+This package holds the C++20 headers, the link library, the CMake package
+(find_package(LumenUtility), target LumenUtility::lumenutility) and the
+pkg-config file (lumenutility).")
 
 set(CPACK_DEBIAN_TOOL_PACKAGE_NAME lumenutil)
 set(CPACK_DEBIAN_TOOL_PACKAGE_SECTION electronics)
 set(CPACK_DEBIAN_TOOL_DESCRIPTION
 "command-line tool for network analyzer measurement files
- lumenutil reads, exports, plots, resamples, converts and compares Touchstone
- files, reads phase calibration files of a phase reference, packs and unpacks
- ZIP archives, maps analyzer error codes to error numbers and reads data
- capture blocks from shared memory.")
+lumenutil reads, exports, plots, resamples, converts and compares Touchstone
+files, reads phase calibration files of a phase reference, packs and unpacks
+ZIP archives, maps analyzer error codes to error numbers and reads data
+capture blocks from shared memory.")
 
 include(CPack)

@@ -1,5 +1,6 @@
 #!/usr/bin/env bash
-# Builds and runs the whole test suite twice: with g++, then with clang under
+# Builds and runs the whole test suite twice: with g++ (then makes the Debian packages of that
+# build and builds a downstream program against them), then with clang under
 # AddressSanitizer and UndefinedBehaviorSanitizer; then the tests of the code two threads
 # meet (acquisition component, property bags, shared-memory names) under ThreadSanitizer.
 set -euo pipefail
@@ -9,9 +10,14 @@ scripts/setup.sh
 jobs=$(nproc)
 
 echo "== Plain build (g++)"
-CC=gcc CXX=g++ cmake -S . -B build -G Ninja -DCMAKE_BUILD_TYPE=RelWithDebInfo >/dev/null
+# Installed under /usr, as the Debian packages are: the library goes to lib/<arch>.
+CC=gcc CXX=g++ cmake -S . -B build -G Ninja -DCMAKE_BUILD_TYPE=RelWithDebInfo \
+  -DCMAKE_INSTALL_PREFIX=/usr >/dev/null
 cmake --build build -j"$jobs"
 ctest --test-dir build --output-on-failure -j"$jobs"
+
+echo "== Debian packages of the plain build, unpacked and used downstream"
+packaging/downstream_test.sh build
 
 echo "== Sanitized build (clang, ASan + UBSan)"
 CC=clang CXX=clang++ cmake -S . -B build-asan -G Ninja -DCMAKE_BUILD_TYPE=Debug \
