@@ -28,3 +28,8 @@ if(LUMEN_BUILD_TESTS AND NOT LUMEN_SANITIZE AND NOT LUMEN_FUZZ
                    --update-command "cmake --build ${PROJECT_BINARY_DIR} --target abi-update")
   add_test(NAME AbiExportsOnlyPublicDeclarations COMMAND ${LUMEN_ABI_CHECK} --check public)
 endif()
+if(LUMEN_BUILD_TESTS)
+  add_test(NAME AbiCheckerFindsChangesAndLeaks
+           COMMAND bash ${PROJECT_SOURCE_DIR}/abi/check_abi_test.sh ${Python3_EXECUTABLE}
+                   ${PROJECT_SOURCE_DIR})
+endif()
