@@ -1,9 +1,9 @@
 #!/usr/bin/env bash
 # Builds and runs the whole test suite twice: with g++ (then the API reference, which fails on
-# an undocumented public member), then with clang under AddressSanitizer and
-# UndefinedBehaviorSanitizer; then the tests of the code two threads meet (acquisition
-# component, property bags, shared-memory names, debug print, beeper and tracing) under
-# ThreadSanitizer.
+# an undocumented public member, and the Debian packages of that build with a downstream program
+# built against them), then with clang under AddressSanitizer and UndefinedBehaviorSanitizer;
+# then the tests of the code two threads meet (acquisition component, property bags,
+# shared-memory names, debug print, beeper and tracing) under ThreadSanitizer.
 set -euo pipefail
 root=$(cd "$(dirname "$0")/.." && pwd)
 cd "$root"
@@ -11,13 +11,18 @@ scripts/setup.sh
 jobs=$(nproc)
 
 echo "== Plain build (g++)"
-CC=gcc CXX=g++ cmake -S . -B build -G Ninja -DCMAKE_BUILD_TYPE=RelWithDebInfo >/dev/null
+# Installed under /usr, as the Debian packages are: the library goes to lib/<arch>.
+CC=gcc CXX=g++ cmake -S . -B build -G Ninja -DCMAKE_BUILD_TYPE=RelWithDebInfo \
+  -DCMAKE_INSTALL_PREFIX=/usr >/dev/null
 cmake --build build -j"$jobs"
 ctest --test-dir build --output-on-failure -j"$jobs"
 
 # The API reference: a public class or function without a comment fails the build.
 echo "== API reference (Doxygen)"
 cmake --build build --target docs
+
+echo "== Debian packages of the plain build, unpacked and used downstream"
+packaging/downstream_test.sh build
 
 echo "== Sanitized build (clang, ASan + UBSan)"
 CC=clang CXX=clang++ cmake -S . -B build-asan -G Ninja -DCMAKE_BUILD_TYPE=Debug \
