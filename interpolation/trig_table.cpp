@@ -24,7 +24,7 @@ TrigTable::TrigTable() {
     // Im((-1)^k (c - i)^-(k + 1)); atan's k-th Taylor coefficient is that for k - 1, over k.
     const std::complex<long double> inverse = 1.0L / std::complex<long double>(c, -1.0L);
     std::complex<long double> power = inverse;
-    for (int k = 1; k <= 7; ++k) {
+    for (int k = 1; k <= 4; ++k) {
       const long double sign = k % 2 == 1 ? 1.0L : -1.0L;
       m_atan[j].d[k - 1] = static_cast<double>(sign * power.imag() / k);
       power *= inverse;

@@ -1,8 +1,8 @@
 // Sine, cosine and arc tangent for the resampling loops, from small tables and short
 // polynomials: inline, branch-light, without divisions (but for arguments beyond 1 of the
-// arc tangent) and several times cheaper than the library calls, with errors of about one
-// unit in the last place of a double (the library's are below one), far below the float
-// precision of the data they serve.
+// arc tangent) and several times cheaper than the library calls. The polynomials stop where
+// the data cannot tell: errors are below 2.5e-12 (sine, cosine) and 2.5e-13 (radians, arc
+// tangent), 20,000 times below the float precision (6e-8) of the values they turn.
 #pragma once
 
 #include <cfloat>
@@ -14,7 +14,7 @@
 namespace LumenUtility {
 
 // Tables of sin and cos at 256 steps around the circle and of atan with its first derivatives
-// at 129 points of [0, 1] (13 KB).
+// at 129 points of [0, 1] (9 KB).
 // Thread-safety: immutable once built; Get() builds the one instance on first use (thread-safe)
 // and callers on any thread share it.
 class TrigTable {
@@ -35,10 +35,10 @@ class TrigTable {
     const double r = (x - k * kStepHigh) - k * kStepLow;
     const Entry& e = m_sinCos[static_cast<std::int64_t>(k) & (kSteps - 1)];
     const double r2 = r * r;
-    // sin r and 1 - cos r as Taylor series: with |r| <= 0.0123 the first terms left out are
-    // below 1e-20 of the result.
-    const double sinR = r + r * r2 * (-1.0 / 6 + r2 * (1.0 / 120 - r2 * (1.0 / 5040)));
-    const double oneMinusCosR = r2 * (0.5 - r2 * (1.0 / 24 - r2 * (1.0 / 720)));
+    // sin r and 1 - cos r as Taylor series: with |r| <= 0.0123 the first terms left out,
+    // r^5 / 120 and r^6 / 720, are below 2.4e-12 and 5e-15.
+    const double sinR = r - r * r2 * (1.0 / 6);
+    const double oneMinusCosR = r2 * (0.5 - r2 * (1.0 / 24));
     // The table value plus a small correction, which keeps the rounding error near half a unit.
     s = e.sin + (e.cos * sinR - e.sin * oneMinusCosR);
     c = e.cos - (e.sin * sinR + e.cos * oneMinusCosR);
@@ -82,14 +82,14 @@ class TrigTable {
   double AtanInUnit(double u) const {
     const double v = std::fabs(u);
     // atan(v) = atan(c + e) with c = j / 128 the nearest table point, as the Taylor series
-    // about c: with |e| <= 1/256 the terms beyond e^7 are below 1e-20. e is exact.
+    // about c: with |e| <= 1/256 the terms beyond e^4, whose coefficients are below 1, add
+    // less than 2e-13. e is exact.
     const double j = RoundToInteger(v * kAtanSteps);
     const double e = v - j * (1.0 / kAtanSteps);
     // A NaN index reads entry 0; the NaN still reaches the result through e.
     const AtanEntry& t = m_atan[j >= 0.0 && j <= kAtanSteps ? static_cast<int>(j) : 0];
     const double series =
-        e * (t.d[0] +
-             e * (t.d[1] + e * (t.d[2] + e * (t.d[3] + e * (t.d[4] + e * (t.d[5] + e * t.d[6]))))));
+        e * (t.d[0] + e * (t.d[1] + e * (t.d[2] + e * t.d[3])));
     const double result = t.atan + series;
     return std::signbit(u) ? -result : result;
   }
@@ -118,10 +118,10 @@ class TrigTable {
     double sin;
     double cos;
   };
-  // atan and its Taylor coefficients d[k - 1] = atan^(k)(c) / k!, k = 1 .. 7, at c.
+  // atan and its Taylor coefficients d[k - 1] = atan^(k)(c) / k!, k = 1 .. 4, at c.
   struct AtanEntry {
     double atan;
-    double d[7];
+    double d[4];
   };
   Entry m_sinCos[kSteps];            // at k * 2 pi / 256
   AtanEntry m_atan[kAtanSteps + 1];  // at c = j / 128
